@@ -42,6 +42,8 @@ constexpr std::int32_t WrappingMultiply(std::int32_t a, std::int32_t b) {
 }
 
 // A count of elements out of an int32 that a malformed block may have made negative.
-constexpr std::size_t Count(std::int32_t size) { return size > 0 ? static_cast<std::size_t>(size) : 0; }
+constexpr std::size_t Count(std::int32_t size) {
+    return size > 0 ? static_cast<std::size_t>(size) : 0;
+}
 
 }  // namespace krnumer

@@ -1,0 +1,9 @@
+/* Everything that krnumer exports. */
+#ifndef KRNUMER_KRNUMER_H
+#define KRNUMER_KRNUMER_H
+
+#include <krnumer/binding.h>
+#include <krnumer/status.h>
+#include <krnumer/types.h>
+
+#endif
