@@ -1,0 +1,88 @@
+// Comparing numbers: bit patterns, units in the last place, and matchers whose messages say how far off a value is.
+#pragma once
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include <bit>
+#include <cmath>
+#include <cstdint>
+#include <limits>
+#include <ostream>
+#include <vector>
+
+#include "frame/complex.h"
+
+namespace krnumer {
+
+inline void PrintTo(Complex z, std::ostream* out) {
+    *out << '(' << z.re << ", " << z.im << ')';
+}
+
+// The one NaN of failed scalar outputs: positive, quiet, empty payload.
+inline bool IsQuietNaN(double x) {
+    return std::bit_cast<std::uint64_t>(x) == 0x7FF8000000000000;
+}
+inline bool IsQuietNaN(Complex z) {
+    return IsQuietNaN(z.re) && IsQuietNaN(z.im);
+}
+
+// Equal to the last bit: tells 0 from -0, and one NaN from another.
+inline bool SameBits(double a, double b) {
+    return std::bit_cast<std::uint64_t>(a) == std::bit_cast<std::uint64_t>(b);
+}
+inline bool SameBits(Complex a, Complex b) {
+    return SameBits(a.re, b.re) && SameBits(a.im, b.im);
+}
+
+// Doubles between a and b, counting b; 0 for equal values and for 0 and -0. The largest number if one is NaN.
+std::uint64_t UlpDistance(double a, double b);
+
+// What stands between a result and the value expected of it: NaN matches NaN, an infinity its like.
+bool IsNear(double actual, double expected, double relative, double absolute);
+bool IsNear(Complex actual, Complex expected, double relative, double absolute);
+
+// EXPECT_THAT(x, Near(2.0, 1e-15)): |x - 2| <= relative |2| + absolute. Complex values by their modulus.
+MATCHER_P3(Near, expected, relative, absolute, "is near " + ::testing::PrintToString(expected)) {
+    return IsNear(arg, expected, relative, absolute);
+}
+template <class T>
+auto Near(T expected, double relative) {
+    return Near(expected, relative, 0.0);
+}
+
+// EXPECT_THAT(x, WithinUlps(2.0, 3))
+MATCHER_P2(WithinUlps, expected, ulps,
+           "is within " + ::testing::PrintToString(ulps) + " ulp of " + ::testing::PrintToString(expected)) {
+    const std::uint64_t distance = UlpDistance(arg, expected);
+    *result_listener << "off by " << distance << " ulp";
+    return distance <= static_cast<std::uint64_t>(ulps);
+}
+
+// EXPECT_THAT(x, QuietNaN())
+MATCHER(QuietNaN, "is the quiet NaN 0x7FF8000000000000") {
+    return IsQuietNaN(arg);
+}
+
+// EXPECT_THAT(y.values(), AllNear(expected, 1e-14)): every element as by Near. The message names the first element
+// that is not, instead of listing all of them.
+MATCHER_P3(AllNear, expected, relative, absolute, "is near, element by element, to what is expected") {
+    if (arg.size() != expected.size()) {
+        *result_listener << arg.size() << " elements instead of " << expected.size();
+        return false;
+    }
+    for (std::size_t i = 0; i < arg.size(); ++i) {
+        if (!IsNear(arg[i], expected[i], relative, absolute)) {
+            *result_listener << "element " << i << " is " << ::testing::PrintToString(arg[i]) << " instead of "
+                             << ::testing::PrintToString(expected[i]);
+            return false;
+        }
+    }
+    return true;
+}
+template <class T>
+auto AllNear(std::vector<T> expected, double relative) {
+    return AllNear(expected, relative, 0.0);
+}
+
+}  // namespace krnumer
