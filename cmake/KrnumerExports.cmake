@@ -21,3 +21,8 @@ file(CONFIGURE OUTPUT ${KRNUMER_VERSION_SCRIPT} CONTENT "{
         *;
 };
 " @ONLY)
+
+# The same names for the tests, one a line.
+set(KRNUMER_EXPORTS_FILE ${PROJECT_BINARY_DIR}/exports.txt)
+list(JOIN KRNUMER_EXPORTED_NAMES "\n" exported)
+file(CONFIGURE OUTPUT ${KRNUMER_EXPORTS_FILE} CONTENT "@exported@\n" @ONLY)

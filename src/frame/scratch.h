@@ -23,7 +23,7 @@ class Scratch {
     enum Fill { kUninitialised, kZeroed };
 
     Scratch() = default;
-    explicit Scratch(std::size_t count, Fill fill = kUninitialised) { Allocate(count, fill); }
+    explicit Scratch(std::size_t count, Fill fill = kUninitialised) { static_cast<void>(Allocate(count, fill)); }
     Scratch(const Scratch&) = delete;
     Scratch& operator=(const Scratch&) = delete;
     Scratch(Scratch&& other) noexcept : data_(std::exchange(other.data_, nullptr)) {}
