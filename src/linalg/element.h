@@ -11,6 +11,16 @@ namespace krnumer {
 template <class T>
 inline constexpr bool kIsComplex = std::is_same_v<T, Complex>;
 
+// The element of real value a.
+template <class T>
+constexpr T FromReal(double a) {
+    if constexpr (kIsComplex<T>) {
+        return {a, 0.0};
+    } else {
+        return a;
+    }
+}
+
 constexpr double Conjugate(double a) {
     return a;
 }

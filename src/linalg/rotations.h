@@ -1,0 +1,43 @@
+// Plane rotations on rows, as the iterations on bidiagonal and tridiagonal matrices gather them for their vectors.
+//
+// The vectors are kept transposed while an iteration runs: one vector is one row, and a complex row is a real row of
+// twice the length, because the rotations themselves are real.
+#pragma once
+
+#include <cmath>
+#include <cstddef>
+
+namespace krnumer {
+
+// sqrt(a^2 + b^2) without overflow or underflow of the squares.
+inline double Hypotenuse(double a, double b) {
+    const double p = std::fabs(a);
+    const double q = std::fabs(b);
+    if (p > q) {
+        const double ratio = q / p;
+        return p * std::sqrt(1.0 + ratio * ratio);
+    }
+    if (q == 0.0) return 0.0;
+    const double ratio = p / q;
+    return q * std::sqrt(1.0 + ratio * ratio);
+}
+
+// Vectors as consecutive rows of `length` doubles; no rows where only values are wanted.
+struct VectorRows {
+    double* rows = nullptr;
+    std::ptrdiff_t length = 0;
+
+    explicit operator bool() const { return rows != nullptr; }
+    double* operator[](std::ptrdiff_t i) const { return rows + i * length; }
+};
+
+// x' = x c + y s and y' = y c - x s on two rows.
+void RotateRows(double* x, double* y, std::ptrdiff_t length, double c, double s);
+
+// A chain of rotations, each on the row that the one before left and the next: rows `first` and `first + step`, then
+// `first + step` and `first + 2 step`, and so on, with (c[0], s[0]), (c[1], s[1]), ... The rows are walked once for the
+// whole chain.
+void RotateChain(VectorRows vectors, std::ptrdiff_t first, std::ptrdiff_t step, std::ptrdiff_t count, const double* c,
+                 const double* s);
+
+}  // namespace krnumer

@@ -1,0 +1,166 @@
+// Matrices to try decompositions on, and what is left over when a decomposition is multiplied out. Row-major, real and
+// complex by one template.
+#pragma once
+
+#include <algorithm>
+#include <cmath>
+#include <cstdint>
+#include <random>
+#include <vector>
+
+#include "frame/complex.h"
+#include "frame/numeric.h"
+#include "linalg/element.h"
+
+namespace krnumer {
+
+template <class T>
+struct DenseMatrix {
+    DenseMatrix(int32_t m, int32_t n) : rows(m), columns(n), elements(Count(m) * Count(n), T{}) {}
+
+    T& operator()(int32_t i, int32_t j) { return elements[Count(i) * Count(columns) + Count(j)]; }
+    T operator()(int32_t i, int32_t j) const { return elements[Count(i) * Count(columns) + Count(j)]; }
+    T* data() { return elements.data(); }
+    const T* data() const { return elements.data(); }
+
+    int32_t rows;
+    int32_t columns;
+    std::vector<T> elements;
+};
+
+using RandomBits = std::mt19937_64;
+
+inline double Uniform(RandomBits& bits) {
+    return 2.0 * std::ldexp(static_cast<double>(bits() >> 11), -53) - 1.0;
+}
+
+template <class T>
+T RandomElement(RandomBits& bits) {
+    if constexpr (kIsComplex<T>) {
+        const double re = Uniform(bits);
+        return {re, Uniform(bits)};
+    } else {
+        return Uniform(bits);
+    }
+}
+
+template <class T, class Element>
+DenseMatrix<T> Generate(int32_t m, int32_t n, Element&& element) {
+    DenseMatrix<T> a(m, n);
+    for (int32_t i = 0; i < m; ++i)
+        for (int32_t j = 0; j < n; ++j) a(i, j) = element(i, j);
+    return a;
+}
+
+template <class T>
+DenseMatrix<T> RandomMatrix(int32_t m, int32_t n, uint64_t seed) {
+    RandomBits bits(seed);
+    return Generate<T>(m, n, [&](int32_t, int32_t) { return RandomElement<T>(bits); });
+}
+
+template <class T>
+DenseMatrix<T> RandomHermitian(int32_t n, uint64_t seed) {
+    DenseMatrix<T> a = RandomMatrix<T>(n, n, seed);
+    for (int32_t i = 0; i < n; ++i) {
+        a(i, i) = FromReal<T>(RealPart(a(i, i)));
+        for (int32_t j = 0; j < i; ++j) a(j, i) = Conjugate(a(i, j));
+    }
+    return a;
+}
+
+// Elements fall off by 10^-12 from the first row and column to the last.
+template <class T>
+DenseMatrix<T> GradedMatrix(int32_t m, int32_t n, uint64_t seed) {
+    DenseMatrix<T> a = RandomMatrix<T>(m, n, seed);
+    for (int32_t i = 0; i < m; ++i)
+        for (int32_t j = 0; j < n; ++j) a(i, j) = a(i, j) * std::pow(10.0, -12.0 * (i + j) / (m + n));
+    return a;
+}
+
+template <class T>
+DenseMatrix<T> IntegerMatrix(int32_t m, int32_t n, uint64_t seed) {
+    RandomBits bits(seed);
+    const auto integer = [&bits] { return static_cast<double>(bits() % 19) - 9.0; };
+    return Generate<T>(m, n, [&](int32_t, int32_t) {
+        if constexpr (kIsComplex<T>) {
+            const double re = integer();
+            return Complex{re, integer()};
+        } else {
+            return integer();
+        }
+    });
+}
+
+template <class T>
+DenseMatrix<T> HilbertMatrix(int32_t m, int32_t n) {
+    return Generate<T>(m, n, [](int32_t i, int32_t j) { return FromReal<T>(1.0 / (i + j + 1)); });
+}
+
+// Row i holds the powers of i / m - 1/2 (times the imaginary unit to the power i, if complex).
+template <class T>
+DenseMatrix<T> VandermondeMatrix(int32_t m, int32_t n) {
+    return Generate<T>(m, n, [m](int32_t i, int32_t j) {
+        const double power = std::pow(static_cast<double>(i) / m - 0.5, j);
+        if constexpr (kIsComplex<T>) {
+            constexpr Complex kTurns[4] = {{1, 0}, {0, 1}, {-1, 0}, {0, -1}};
+            return kTurns[(i * j) % 4] * power;
+        } else {
+            return power;
+        }
+    });
+}
+
+template <class T>
+DenseMatrix<T> Product(const DenseMatrix<T>& a, const DenseMatrix<T>& b) {
+    DenseMatrix<T> c(a.rows, b.columns);
+    for (int32_t i = 0; i < a.rows; ++i)
+        for (int32_t k = 0; k < a.columns; ++k)
+            for (int32_t j = 0; j < b.columns; ++j) c(i, j) += a(i, k) * b(k, j);
+    return c;
+}
+
+template <class T>
+DenseMatrix<T> Adjoint(const DenseMatrix<T>& a) {
+    return Generate<T>(a.columns, a.rows, [&a](int32_t i, int32_t j) { return Conjugate(a(j, i)); });
+}
+
+template <class T>
+DenseMatrix<T> RankDeficientMatrix(int32_t m, int32_t n, int32_t rank, uint64_t seed) {
+    return Product(RandomMatrix<T>(m, rank, seed), RandomMatrix<T>(rank, n, seed + 1));
+}
+
+// Columns times the given reals.
+template <class T>
+DenseMatrix<T> ColumnsScaled(const DenseMatrix<T>& a, const std::vector<double>& factors) {
+    return Generate<T>(a.rows, static_cast<int32_t>(factors.size()),
+                       [&](int32_t i, int32_t j) { return a(i, j) * factors[Count(j)]; });
+}
+
+template <class T>
+double FrobeniusNorm(const DenseMatrix<T>& a) {
+    double largest = 0.0;
+    for (const T& x : a.elements) largest = std::max(largest, SumOfParts(x));
+    if (largest == 0.0) return 0.0;
+    double sum = 0.0;
+    for (const T& x : a.elements) sum += SquaredModulus(x / largest);
+    return largest * std::sqrt(sum);
+}
+
+// Frobenius norm of the difference, NaN included.
+template <class T>
+double Distance(const DenseMatrix<T>& a, const DenseMatrix<T>& b) {
+    if (a.rows != b.rows || a.columns != b.columns) return kInfinity;
+    double sum = 0.0;
+    for (std::size_t i = 0; i < a.elements.size(); ++i) sum += SquaredModulus(a.elements[i] - b.elements[i]);
+    return std::sqrt(sum);
+}
+
+// How far the columns are from orthonormal.
+template <class T>
+double Unorthogonality(const DenseMatrix<T>& q) {
+    const auto identity =
+        Generate<T>(q.columns, q.columns, [](int32_t i, int32_t j) { return FromReal<T>(i == j ? 1.0 : 0.0); });
+    return Distance(Product(Adjoint(q), q), identity);
+}
+
+}  // namespace krnumer
