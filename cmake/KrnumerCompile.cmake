@@ -28,4 +28,7 @@ set(KRNUMER_SANITIZE "" CACHE STRING "Sanitizers to build with, such as address,
 if(KRNUMER_SANITIZE)
     add_compile_options(-fsanitize=${KRNUMER_SANITIZE} -fno-sanitize-recover=all -fno-omit-frame-pointer)
     add_link_options(-fsanitize=${KRNUMER_SANITIZE})
+    if(KRNUMER_SANITIZE MATCHES address)
+        add_compile_definitions(KRNUMER_ASAN)
+    endif()
 endif()

@@ -13,12 +13,7 @@
 
 #include "settings.h"
 
-#if defined(__has_feature)
-#if __has_feature(address_sanitizer)
-#define __SANITIZE_ADDRESS__ 1
-#endif
-#endif
-#if defined(__SANITIZE_ADDRESS__)
+#if defined(KRNUMER_ASAN)
 #include <sanitizer/asan_interface.h>
 #else
 #define ASAN_POISON_MEMORY_REGION(address, size) ((void)(address), (void)(size))
@@ -85,6 +80,7 @@ void FreeAbandoned(Block& block) {
 
 Memory Memory::Allocate(std::size_t bytes) {
     if (bytes > PTRDIFF_MAX) return {};
+    bytes = std::max<std::size_t>(bytes, 1);
     void* base = nullptr;
 #if defined(_WIN32)
     base = _aligned_malloc(bytes, kBoundary);
@@ -115,6 +111,7 @@ Block* NewBlock(int32_t rank, std::size_t bytes) {
         return nullptr;
     }
     Place(*block, memory, offset, bytes);
+    if (ThreadSettings().moving_blocks) std::memset(block->start, KRRT_FRESH_BYTE, bytes);
     ++live_blocks;
     return block;
 }

@@ -11,6 +11,7 @@
 #include <cstring>
 #include <initializer_list>
 #include <span>
+#include <stdexcept>
 #include <type_traits>
 #include <utility>
 #include <vector>
@@ -165,6 +166,17 @@ class HostCube : public HostElements<T> {
     int32_t pages() const { return this->dimension(0); }
     int32_t rows() const { return this->dimension(1); }
     int32_t columns() const { return this->dimension(2); }
+    T operator()(int32_t page, int32_t row, int32_t column) const { return this->Get(Index(page, row, column)); }
+    void Set(int32_t page, int32_t row, int32_t column, const T& value) { this->Put(Index(page, row, column), value); }
+
+  private:
+    std::size_t Index(int32_t page, int32_t row, int32_t column) const {
+        if (page < 0 || row < 0 || row >= rows() || column < 0 || column >= columns()) {
+            throw std::out_of_range("no such element");
+        }
+        const auto size = [](int32_t n) { return static_cast<std::size_t>(n); };
+        return (size(page) * size(rows()) + size(row)) * size(columns()) + size(column);
+    }
 };
 
 // ---- Guards: a setting of the host for the scope, in the calling thread -------------------------------------------
@@ -264,6 +276,8 @@ class LeakCheck : Guard {
   public:
     LeakCheck() : live_blocks_(KrrtLiveBlocks()) {}
     ~LeakCheck() { EXPECT_EQ(KrrtLiveBlocks(), live_blocks_) << "blocks of the host were not freed"; }
+
+    int64_t live_before() const { return live_blocks_; }
 
   private:
     int64_t live_blocks_;

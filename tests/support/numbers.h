@@ -5,19 +5,17 @@
 #include <gtest/gtest.h>
 
 #include <bit>
-#include <cmath>
 #include <cstdint>
-#include <limits>
-#include <ostream>
+#include <initializer_list>
+#include <iosfwd>
+#include <string>
 #include <vector>
 
 #include "frame/complex.h"
 
 namespace krnumer {
 
-inline void PrintTo(Complex z, std::ostream* out) {
-    *out << '(' << z.re << ", " << z.im << ')';
-}
+void PrintTo(Complex z, std::ostream* out);
 
 // The one NaN of failed scalar outputs: positive, quiet, empty payload.
 inline bool IsQuietNaN(double x) {
@@ -38,12 +36,18 @@ inline bool SameBits(Complex a, Complex b) {
 // Doubles between a and b, counting b; 0 for equal values and for 0 and -0. The largest number if one is NaN.
 std::uint64_t UlpDistance(double a, double b);
 
-// What stands between a result and the value expected of it: NaN matches NaN, an infinity its like.
-bool IsNear(double actual, double expected, double relative, double absolute);
-bool IsNear(Complex actual, Complex expected, double relative, double absolute);
+// |actual - expected| <= relative |expected| + absolute. NaN is near NaN, an infinity near itself; complex values
+// are compared by modulus, or part by part when one of the expected parts is not finite.
+bool IsNear(double actual, double expected, double relative, double absolute = 0.0);
+bool IsNear(Complex actual, Complex expected, double relative, double absolute = 0.0);
 
-// EXPECT_THAT(x, Near(2.0, 1e-15)): |x - 2| <= relative |2| + absolute. Complex values by their modulus.
-MATCHER_P3(Near, expected, relative, absolute, "is near " + ::testing::PrintToString(expected)) {
+// With all the digits that tell it from its neighbours.
+std::string Show(double x);
+std::string Show(Complex z);
+
+// EXPECT_THAT(x, Near(2.0, 1e-15)), with a third argument for an absolute tolerance: as by IsNear.
+MATCHER_P3(Near, expected, relative, absolute, "is near " + Show(expected)) {
+    *result_listener << "which is " << Show(arg);
     return IsNear(arg, expected, relative, absolute);
 }
 template <class T>
@@ -53,9 +57,9 @@ auto Near(T expected, double relative) {
 
 // EXPECT_THAT(x, WithinUlps(2.0, 3))
 MATCHER_P2(WithinUlps, expected, ulps,
-           "is within " + ::testing::PrintToString(ulps) + " ulp of " + ::testing::PrintToString(expected)) {
+           "is within " + ::testing::PrintToString(ulps) + " units in the last place of " + Show(expected)) {
     const std::uint64_t distance = UlpDistance(arg, expected);
-    *result_listener << "off by " << distance << " ulp";
+    *result_listener << "which is " << Show(arg) << ", off by " << distance;
     return distance <= static_cast<std::uint64_t>(ulps);
 }
 
@@ -64,25 +68,43 @@ MATCHER(QuietNaN, "is the quiet NaN 0x7FF8000000000000") {
     return IsQuietNaN(arg);
 }
 
-// EXPECT_THAT(y.values(), AllNear(expected, 1e-14)): every element as by Near. The message names the first element
-// that is not, instead of listing all of them.
+// EXPECT_THAT(y.values(), AllNear(expected, 1e-14)), or with a list in braces: every element as by Near. The message
+// names the first element that is not, instead of listing them all.
 MATCHER_P3(AllNear, expected, relative, absolute, "is near, element by element, to what is expected") {
     if (arg.size() != expected.size()) {
-        *result_listener << arg.size() << " elements instead of " << expected.size();
+        *result_listener << "which has " << arg.size() << " elements instead of " << expected.size();
         return false;
     }
     for (std::size_t i = 0; i < arg.size(); ++i) {
         if (!IsNear(arg[i], expected[i], relative, absolute)) {
-            *result_listener << "element " << i << " is " << ::testing::PrintToString(arg[i]) << " instead of "
-                             << ::testing::PrintToString(expected[i]);
+            *result_listener << "whose element " << i << " is " << Show(arg[i]) << " instead of " << Show(expected[i]);
             return false;
         }
     }
     return true;
 }
 template <class T>
-auto AllNear(std::vector<T> expected, double relative) {
+auto AllNear(const std::vector<T>& expected, double relative) {
     return AllNear(expected, relative, 0.0);
+}
+template <class T>
+auto AllNear(std::initializer_list<T> expected, double relative, double absolute = 0.0) {
+    return AllNear(std::vector<T>(expected), relative, absolute);
+}
+
+// EXPECT_THAT(y.values(), SameBitsAs(expected)): equal to the last bit, NaNs and signs of zeros included.
+MATCHER_P(SameBitsAs, expected, "is equal, bit by bit, to what is expected") {
+    if (arg.size() != expected.size()) {
+        *result_listener << "which has " << arg.size() << " elements instead of " << expected.size();
+        return false;
+    }
+    for (std::size_t i = 0; i < arg.size(); ++i) {
+        if (!SameBits(arg[i], expected[i])) {
+            *result_listener << "whose element " << i << " is " << Show(arg[i]) << " instead of " << Show(expected[i]);
+            return false;
+        }
+    }
+    return true;
 }
 
 }  // namespace krnumer

@@ -19,7 +19,7 @@
 #ifndef KRRT_KRRT_H
 #define KRRT_KRRT_H
 
-#include "krnumer/types.h"
+#include <krnumer/types.h>
 
 #if !defined(_WIN32)
 #define KRRT_EXPORT __attribute__((visibility("default")))
@@ -104,7 +104,7 @@ KRRT_API int32_t ResizeNumberBlock(int32_t typeCode, int32_t numDims, KrHandle* 
  */
 KRRT_API void HookCleanup(void (*procedure)(void* data), void* data, int32_t mode);
 
-/** Creates a block of bytes, not initialised, at a 64-byte boundary. Null when it cannot be had. */
+/** Creates a block of bytes, not initialised, at a 64-byte boundary. Null for a negative size or without memory. */
 KRRT_API KrHandle MakeBlock(int32_t bytes);
 
 /** Resizes a block of bytes; contents up to the lesser size stay. 0, or another status with the block as it was. */
@@ -148,9 +148,10 @@ KRRT_API int32_t KrrtPendingCleanups(KrrtInstance* instance);
 KRRT_API int32_t KrrtLeastAlignment(int32_t on);
 
 /**
- * 1: every resize moves the block, even to the same size. What the block gains is filled with the byte 0xC3. The
- * old block is filled with 0xA5 and kept until the array is resized again or freed, when writes to it are noticed
- * (KrrtStaleWrites). 0, the default: blocks move only when they have to. Returns the former setting.
+ * 1: every resize moves the block, even to the same size. What the block gains, and all of a block that MakeBlock
+ * gives, is filled with the byte 0xC3. The old block is filled with 0xA5 and kept until the array is resized again or
+ * freed, when writes to it are noticed (KrrtStaleWrites). 0, the default: blocks move only when they have to. Returns
+ * the former setting.
  */
 KRRT_API int32_t KrrtMovingBlocks(int32_t on);
 
@@ -199,5 +200,10 @@ KRRT_API int64_t KrrtLiveBlocks(void);
 
 /** Abandoned blocks (KrrtMovingBlocks) that were written to after the resize that moved them, in the whole process. */
 KRRT_API int64_t KrrtStaleWrites(void);
+
+/* ---- Texts -------------------------------------------------------------------------------------------------- */
+
+/** What a status of krnumer or of this host means, in English; a static text, never null. */
+KRRT_API const char* KrrtStatusText(int32_t status);
 
 #endif

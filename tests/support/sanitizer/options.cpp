@@ -1,0 +1,18 @@
+// Options of the sanitizers, compiled into every test program: the run time looks them up by these names. Sizes near
+// the limit of int32 are asked for on purpose, and have to be refused by a null pointer, not by the end of the process.
+
+extern "C" {
+
+__attribute__((visibility("default"))) const char* __asan_default_options() {
+    return "allocator_may_return_null=1:max_allocation_size_mb=4096";
+}
+
+__attribute__((visibility("default"))) const char* __tsan_default_options() {
+    return "allocator_may_return_null=1";
+}
+
+__attribute__((visibility("default"))) const char* __ubsan_default_options() {
+    return "print_stacktrace=1";
+}
+
+}  // extern "C"
