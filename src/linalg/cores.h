@@ -1,0 +1,22 @@
+// The cores of linear algebra that other families call. Matrices are dense and row-major, sizes int32, the result is
+// a status. Each core is one template over the element; its complex form also goes by a name of its own.
+#pragma once
+
+#include "linalg/finite.h"
+#include "linalg/packed.h"
+#include "linalg/products.h"
+#include "linalg/special_matrix.h"
+#include "linalg/transpose.h"
+
+namespace krnumer {
+
+inline constexpr auto& CxMatMulCore = MatMulCore<Complex>;
+inline constexpr auto& CxMatVecCore = MatVecCore<Complex>;
+inline constexpr auto& CxDotCore = DotCore<Complex>;
+inline constexpr auto& CxTransposeCore = TransposeCore<Complex>;
+inline constexpr auto& CxConjTransposeCore = ConjTransposeCore<Complex>;
+inline constexpr auto& CxPackTriangle = PackTriangle<Complex>;
+inline constexpr auto& CxUnpackTriangle = UnpackTriangle<Complex>;
+inline constexpr auto& CxMakeSpecialMatrix = MakeSpecialMatrix<Complex>;
+
+}  // namespace krnumer
