@@ -48,8 +48,11 @@ lint:
 install: build
 	cmake --install $(BUILD) --prefix $(PREFIX)
 
-package: build
-	cd $(BUILD) && cpack -G DEB
+package:
+	tools/setup build package
+	cmake --preset package
+	cmake --build --preset package --parallel $(JOBS)
+	cd build/package && cpack -G DEB
 
 clean:
 	rm -rf build

@@ -12,7 +12,9 @@ find_library(OpenBLASSerial_LIBRARY
     PATHS /usr/lib/${CMAKE_LIBRARY_ARCHITECTURE} /usr/lib64 /usr/lib /usr/local/lib
     PATH_SUFFIXES openblas-serial lib
     NO_DEFAULT_PATH)
-mark_as_advanced(OpenBLASSerial_LIBRARY)
+# Its license, to be handed on with the binary.
+find_file(OpenBLASSerial_COPYRIGHT copyright PATHS /usr/share/doc/libopenblas-serial-dev NO_DEFAULT_PATH)
+mark_as_advanced(OpenBLASSerial_LIBRARY OpenBLASSerial_COPYRIGHT)
 
 include(FindPackageHandleStandardArgs)
 find_package_handle_standard_args(OpenBLASSerial REQUIRED_VARS OpenBLASSerial_LIBRARY
