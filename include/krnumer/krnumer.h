@@ -3,7 +3,9 @@
 #define KRNUMER_KRNUMER_H
 
 #include <krnumer/binding.h>
+#include <krnumer/gen.h>
 #include <krnumer/linalg.h>
+#include <krnumer/stat.h>
 #include <krnumer/status.h>
 #include <krnumer/types.h>
 
