@@ -30,7 +30,7 @@ TEST(Scratch, MovesItsElements) {
     Scratch<int> first(1);
     first[0] = 9;
     Scratch<int> second = std::move(first);
-    EXPECT_FALSE(first);
+    EXPECT_FALSE(first);  // NOLINT(bugprone-use-after-move)
     EXPECT_EQ(second[0], 9);
 }
 
