@@ -5,6 +5,7 @@
 #include <krnumer/binding.h>
 #include <krnumer/gen.h>
 #include <krnumer/linalg.h>
+#include <krnumer/special.h>
 #include <krnumer/stat.h>
 #include <krnumer/status.h>
 #include <krnumer/types.h>

@@ -1,0 +1,42 @@
+// Special functions have no arrays and no status: their scenes only show that they are called and repeat.
+#include "krnumer/special.h"
+
+#include "sweep/sweep.h"
+
+namespace {
+
+template <class... Parameters, class... Arguments>
+int32_t Plain(sweep::Scene& scene, void (*function)(Parameters...), Arguments... arguments) {
+    double* const out = scene.Number();
+    return scene.Call([&] {
+        function(arguments..., out);
+        return 0;
+    });
+}
+
+}  // namespace
+
+SWEEP(KR_Gamma) {
+    return Plain(scene, KR_Gamma, 2.5, 1.0);
+}
+SWEEP(KR_GammaC) {
+    return Plain(scene, KR_GammaC, 2.5, 6.0);
+}
+SWEEP(KR_LnGamma) {
+    return Plain(scene, KR_LnGamma, 40.0);
+}
+SWEEP(KR_Beta) {
+    return Plain(scene, KR_Beta, 2.0, 3.0, 0.4);
+}
+SWEEP(KR_Fact) {
+    return Plain(scene, KR_Fact, 40);
+}
+SWEEP(KR_LnFact) {
+    return Plain(scene, KR_LnFact, 40);
+}
+SWEEP(KR_Psi) {
+    return Plain(scene, KR_Psi, -1.3);
+}
+SWEEP(KR_Stirling) {
+    return Plain(scene, KR_Stirling, 40.0);
+}
