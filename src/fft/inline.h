@@ -1,0 +1,13 @@
+// Forced inlining: a butterfly is one long block only if everything it calls dissolves in it, whatever the compiler
+// thinks of the size of the result.
+#pragma once
+
+#if defined(_MSC_VER) && !defined(__clang__)
+#define KRNUMER_FFT_INLINE __forceinline
+#define KRNUMER_FFT_INLINE_LAMBDA
+#define KRNUMER_FFT_NOINLINE __declspec(noinline)
+#else
+#define KRNUMER_FFT_INLINE inline __attribute__((always_inline))
+#define KRNUMER_FFT_INLINE_LAMBDA __attribute__((always_inline))
+#define KRNUMER_FFT_NOINLINE __attribute__((noinline))
+#endif

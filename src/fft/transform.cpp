@@ -1,0 +1,193 @@
+// The drivers: decimation in time over the factors of a table, depth first, so that a block is finished while it is
+// close at hand.
+#include <cstddef>
+
+#include "fft/direct.h"
+#include "fft/fft.h"
+#include "fft/rader.h"
+#include "fft/table.h"
+#include "frame/complex.h"
+#include "frame/status.h"
+
+namespace krnumer {
+namespace {
+
+// ---- One factor, by its kind ----
+
+int32_t RunRealLeaf(const qmfft_table* table, int32_t i, const double* in, double* out, int32_t in_stride,
+                    int32_t out_stride, int32_t how_many) {
+    const int32_t r = table->factors[i];
+    switch (table->kinds[i]) {
+        case kButterfly:
+            table->realLeaf[i](in, out, in_stride, out_stride, how_many);
+            return kOk;
+        case kDirect:
+            return DirectRealLeaf(r, *table->stages[i], in, out, in_stride, out_stride, how_many);
+        default:
+            return RaderRealLeaf(r, *table->stages[i], in, out, in_stride, out_stride, how_many);
+    }
+}
+
+int32_t RunRealStage(const qmfft_table* table, int32_t i, double* data, int32_t stride, int32_t m) {
+    const int32_t r = table->factors[i];
+    const stage_tables& stage = *table->stages[i];
+    switch (table->kinds[i]) {
+        case kButterfly:
+            table->realStage[i](data, stage.twiddleRe, stage.twiddleIm, stride, m);
+            return kOk;
+        case kDirect:
+            return DirectRealStage(r, stage, data, stride, m);
+        default:
+            return RaderRealStage(r, stage, data, stride, m);
+    }
+}
+
+int32_t RunComplexLeaf(const qmfft_table* table, int32_t i, const double* in_re, const double* in_im, double* out_re,
+                       double* out_im, int32_t in_stride, int32_t out_stride, int32_t how_many) {
+    const int32_t r = table->factors[i];
+    switch (table->kinds[i]) {
+        case kButterfly:
+            table->cplxLeaf[i](in_re, in_im, out_re, out_im, in_stride, out_stride, how_many);
+            return kOk;
+        case kDirect:
+            return DirectComplexLeaf(r, *table->stages[i], in_re, in_im, out_re, out_im, in_stride, out_stride,
+                                     how_many);
+        default:
+            return RaderComplexLeaf(r, *table->stages[i], in_re, in_im, out_re, out_im, in_stride, out_stride,
+                                    how_many);
+    }
+}
+
+int32_t RunComplexStage(const qmfft_table* table, int32_t i, double* re, double* im, int32_t stride, int32_t m) {
+    const int32_t r = table->factors[i];
+    const stage_tables& stage = *table->stages[i];
+    switch (table->kinds[i]) {
+        case kButterfly:
+            table->cplxStage[i](re, im, stage.twiddleRe, stage.twiddleIm, stride, m);
+            return kOk;
+        case kDirect:
+            return DirectComplexStage(r, stage, re, im, stride, m);
+        default:
+            return RaderComplexStage(r, stage, re, im, stride, m);
+    }
+}
+
+// ---- All factors from i on ----
+
+int32_t RealFFTStep(int32_t n, const qmfft_table* table, int32_t i, const double* in, double* out, int32_t in_stride,
+                    int32_t out_stride) {
+    const int32_t r = table->factors[i];
+    const int32_t m = n / r;
+    if (i == table->factorCount - 2) {
+        if (const int32_t status = RunRealLeaf(table, i + 1, in, out, in_stride, out_stride, r)) return status;
+    } else {
+        const ptrdiff_t block = ptrdiff_t{m} * out_stride;
+        for (int32_t b = 0; b < r; ++b) {
+            if (const int32_t status = RealFFTStep(m, table, i + 1, in + ptrdiff_t{b} * in_stride, out + b * block,
+                                                   r * in_stride, out_stride)) {
+                return status;
+            }
+        }
+    }
+    return RunRealStage(table, i, out, out_stride, m);
+}
+
+int32_t ComplexFFTStep(int32_t n, const qmfft_table* table, int32_t i, const double* in_re, const double* in_im,
+                       double* out_re, double* out_im, int32_t in_stride, int32_t out_stride) {
+    const int32_t r = table->factors[i];
+    const int32_t m = n / r;
+    if (i == table->factorCount - 2) {
+        if (const int32_t status =
+                RunComplexLeaf(table, i + 1, in_re, in_im, out_re, out_im, in_stride, out_stride, r)) {
+            return status;
+        }
+    } else {
+        const ptrdiff_t block = ptrdiff_t{m} * out_stride;
+        for (int32_t b = 0; b < r; ++b) {
+            const ptrdiff_t from = ptrdiff_t{b} * in_stride;
+            const ptrdiff_t to = b * block;
+            if (const int32_t status = ComplexFFTStep(m, table, i + 1, in_re + from, in_im + from, out_re + to,
+                                                      out_im + to, r * in_stride, out_stride)) {
+                return status;
+            }
+        }
+    }
+    return RunComplexStage(table, i, out_re, out_im, out_stride, m);
+}
+
+// Turns half-complex form into Hartley form, up to the order of the halves.
+void FoldHalves(double* data, int32_t stride, int32_t n) {
+    for (int32_t k = 1; k < (n + 1) / 2; ++k) {
+        double& lower = data[ptrdiff_t{k} * stride];
+        double& upper = data[ptrdiff_t{n - k} * stride];
+        const double a = lower;
+        const double b = upper;
+        lower = a - b;
+        upper = a + b;
+    }
+}
+
+}  // namespace
+
+int32_t ComplexFFT(const qmfft_table* table, const double* in_re, const double* in_im, double* out_re, double* out_im,
+                   int32_t in_stride, int32_t out_stride, int32_t n) {
+    if (n != table->length) return kLengthMismatch;
+    if (n == 1) {
+        *out_re = *in_re;
+        *out_im = *in_im;
+        return kOk;
+    }
+    if (table->factorCount == 1)
+        return RunComplexLeaf(table, 0, in_re, in_im, out_re, out_im, in_stride, out_stride, 1);
+    return ComplexFFTStep(n, table, 0, in_re, in_im, out_re, out_im, in_stride, out_stride);
+}
+
+int32_t RealFFT(const qmfft_table* table, const double* in, double* out, int32_t in_stride, int32_t out_stride,
+                int32_t n) {
+    if (n != table->length) return kLengthMismatch;
+    if (n == 1) {
+        *out = *in;
+        return kOk;
+    }
+    if (table->factorCount == 1) return RunRealLeaf(table, 0, in, out, in_stride, out_stride, 1);
+    return RealFFTStep(n, table, 0, in, out, in_stride, out_stride);
+}
+
+// A forward transform of a spectrum gives n x[-j].
+int32_t InverseComplexFFT(const qmfft_table* table, const double* in_re, const double* in_im, double* out_re,
+                          double* out_im, int32_t in_stride, int32_t out_stride, int32_t n) {
+    if (const int32_t status = ComplexFFT(table, in_re, in_im, out_re, out_im, in_stride, out_stride, n)) return status;
+    const double scale = 1.0 / n;
+    const auto value = [&](int32_t k) {
+        const ptrdiff_t at = ptrdiff_t{k} * out_stride;
+        return Complex{out_re[at], out_im[at]};
+    };
+    const auto store = [&](int32_t k, Complex x) {
+        const ptrdiff_t at = ptrdiff_t{k} * out_stride;
+        out_re[at] = x.re * scale;
+        out_im[at] = x.im * scale;
+    };
+    for (int32_t k = 1; k <= (n - 1) / 2; ++k) {
+        const Complex lower = value(k);
+        store(k, value(n - k));
+        store(n - k, lower);
+    }
+    store(0, value(0));
+    if (n % 2 == 0) store(n / 2, value(n / 2));
+    return kOk;
+}
+
+// The Hartley transform is its own inverse, and half-complex form is a fold away from it on either side.
+// Source: R. N. Bracewell, The Hartley Transform, Oxford 1986.
+int32_t InverseRealFFT(const qmfft_table* table, double* in, double* out, int32_t in_stride, int32_t out_stride,
+                       int32_t n) {
+    if (n != table->length) return kLengthMismatch;
+    const double scale = 1.0 / n;
+    for (int32_t k = 0; k < n; ++k) in[ptrdiff_t{k} * in_stride] *= scale;
+    FoldHalves(in, in_stride, n);
+    if (const int32_t status = RealFFT(table, in, out, in_stride, out_stride, n)) return status;
+    FoldHalves(out, out_stride, n);
+    return kOk;
+}
+
+}  // namespace krnumer
