@@ -9,5 +9,6 @@
 #include <krnumer/stat.h>
 #include <krnumer/status.h>
 #include <krnumer/types.h>
+#include <krnumer/window.h>
 
 #endif
