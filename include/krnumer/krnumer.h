@@ -3,6 +3,7 @@
 #define KRNUMER_KRNUMER_H
 
 #include <krnumer/binding.h>
+#include <krnumer/distributions.h>
 #include <krnumer/gen.h>
 #include <krnumer/linalg.h>
 #include <krnumer/special.h>
