@@ -4,6 +4,7 @@
 
 #include <krnumer/binding.h>
 #include <krnumer/distributions.h>
+#include <krnumer/filter.h>
 #include <krnumer/gen.h>
 #include <krnumer/linalg.h>
 #include <krnumer/special.h>
