@@ -126,4 +126,104 @@ KRNUMER_API void KR_Psi(double x, double* out);
  */
 KRNUMER_API void KR_Stirling(double x, double* out);
 
+/**
+ * Error function, erf x = 2 / sqrt(pi) * integral of e^(-t^2) from 0 to x.
+ *
+ * A rational approximation for |x| <= 1, otherwise 1 - erfc x. Relative error below 3 eps. 1 at +infinity, -1 at
+ * -infinity.
+ *
+ * @param[in]  x    any
+ * @param[out] out  erf x
+ */
+KRNUMER_API void KR_Erf(double x, double* out);
+
+/**
+ * Complementary error function, erfc x = 1 - erf x.
+ *
+ * e^(-x^2) times a rational approximation for |x| from 1 on. The exponential is taken of the rounded square, so the
+ * relative error grows with x^2: 1e-14 up to 8, 1e-13 at 26. The results are 2 and 0 where e^(-x^2) underflows, below
+ * -26.7 and above 26.7, and at the infinities.
+ *
+ * @param[in]  x    any
+ * @param[out] out  erfc x
+ */
+KRNUMER_API void KR_ErfC(double x, double* out);
+
+/**
+ * Dawson's integral, e^(-x^2) * integral of e^(t^2) from 0 to x.
+ *
+ * Rational approximations, 1 / (2x) above 1e9. Relative error below 3 eps. NaN for infinite x.
+ *
+ * @param[in]  x    any
+ * @param[out] out  Dawson's integral
+ */
+KRNUMER_API void KR_Dawson(double x, double* out);
+
+/**
+ * Fresnel integrals, C(x) of cos(pi t^2 / 2) and S(x) of sin(pi t^2 / 2), from 0 to x.
+ *
+ * Rational approximations for x^2 < 2.5625, otherwise through auxiliary functions. Relative error below 5 eps up to
+ * there, absolute error 5e-15 up to 40 and 1e-11 up to 36974. Beyond, for finite x, both are +-0.5, off by up to 9e-6.
+ * For an infinite x both are that infinity.
+ *
+ * @param[in]  x  any
+ * @param[out] c  C(x); may be null
+ * @param[out] s  S(x); may be null
+ */
+KRNUMER_API void KR_FresnelIntegrals(double x, double* c, double* s);
+
+/**
+ * Exponential integral, E_n(x) = integral of e^(-x t) / t^n from 1 to infinity.
+ *
+ * e^-x / x for n = 0; a power series up to x = 1, a continued fraction beyond; for n above 5000 three terms of the
+ * expansion in 1 / (x + n)^2. Error below 10 eps, relative or absolute whichever is larger. 0 for x above 709.78. At x
+ * = 0, +infinity for n = 0 and 1, otherwise 1 / (n - 1). NaN for negative n, negative x and infinite x.
+ *
+ * @param[in]  x    x >= 0
+ * @param[in]  n    order, n >= 0
+ * @param[out] out  E_n(x)
+ */
+KRNUMER_API void KR_ExpI(double x, int32_t n, double* out);
+
+/**
+ * Cosine integral, Ci(x) = gamma + ln|x| + integral of (cos t - 1) / t from 0 to |x|.
+ *
+ * Rational approximations up to 4, through auxiliary functions beyond. Error below 8 eps, relative or absolute
+ * whichever is larger. -infinity at 0, 0 at +infinity, NaN at -infinity; a finite negative x counts as |x|.
+ *
+ * @param[in]  x    any
+ * @param[out] out  Ci(x)
+ */
+KRNUMER_API void KR_CosI(double x, double* out);
+
+/**
+ * Sine integral, Si(x) = integral of sin t / t from 0 to x. Methods of KR_CosI; relative error below 2 eps. +-pi / 2 at
+ * the infinities.
+ *
+ * @param[in]  x    any
+ * @param[out] out  Si(x)
+ */
+KRNUMER_API void KR_SinI(double x, double* out);
+
+/**
+ * Hyperbolic cosine integral, Chi(x) = gamma + ln|x| + integral of (cosh t - 1) / t from 0 to |x|.
+ *
+ * A power series up to 8, Chebyshev series beyond; they are fitted up to 88 and lose digits above. Error below 4 eps,
+ * relative or absolute whichever is larger, up to 88; relative error 2e-14 at 100, 2e-10 at 200, 9e-9 at 709. -infinity
+ * at 0, +infinity for |x| from 709.79 on and at the infinities.
+ *
+ * @param[in]  x    any
+ * @param[out] out  Chi(x)
+ */
+KRNUMER_API void KR_CoshI(double x, double* out);
+
+/**
+ * Hyperbolic sine integral, Shi(x) = integral of sinh t / t from 0 to x. Methods of KR_CoshI; relative error below 4
+ * eps up to 88, 9e-15 at 100, 8e-11 at 200, 4e-9 at 709. +-infinity for |x| from 709.79 on.
+ *
+ * @param[in]  x    any
+ * @param[out] out  Shi(x)
+ */
+KRNUMER_API void KR_SinhI(double x, double* out);
+
 #endif

@@ -40,3 +40,35 @@ SWEEP(KR_Psi) {
 SWEEP(KR_Stirling) {
     return Plain(scene, KR_Stirling, 40.0);
 }
+
+SWEEP(KR_Erf) {
+    return Plain(scene, KR_Erf, 0.5);
+}
+SWEEP(KR_ErfC) {
+    return Plain(scene, KR_ErfC, 2.0);
+}
+SWEEP(KR_Dawson) {
+    return Plain(scene, KR_Dawson, 5.0);
+}
+SWEEP(KR_FresnelIntegrals) {
+    double* const values = scene.Numbers(2);
+    return scene.Call([&] {
+        KR_FresnelIntegrals(3.0, values, values + 1);
+        return 0;
+    });
+}
+SWEEP(KR_ExpI) {
+    return Plain(scene, KR_ExpI, 0.5, 3);
+}
+SWEEP(KR_CosI) {
+    return Plain(scene, KR_CosI, 6.0);
+}
+SWEEP(KR_SinI) {
+    return Plain(scene, KR_SinI, 6.0);
+}
+SWEEP(KR_CoshI) {
+    return Plain(scene, KR_CoshI, 10.0);
+}
+SWEEP(KR_SinhI) {
+    return Plain(scene, KR_SinhI, 10.0);
+}

@@ -80,6 +80,6 @@ def every(*draws):
 
 
 def functions():
-    from . import gamma
+    from . import gamma, integrals
 
-    return [f for family in (gamma,) for f in family.FUNCTIONS]
+    return [f for family in (gamma, integrals) for f in family.FUNCTIONS]
