@@ -149,9 +149,13 @@ int32_t ArrayView::ResizeTo(const int32_t* dimensions) {
         if (total < 0 || total > std::numeric_limits<int32_t>::max()) return kOutOfMemory;
     }
     if (const int32_t status = ResizeBlock(kind_.type_code, static_cast<int32_t>(total))) return status;
+    DeclareAs(dimensions);
+    return kOk;
+}
+
+void ArrayView::DeclareAs(const int32_t* dimensions) {
     StoreDimensions(dimensions);
     sized_ = true;
-    return kOk;
 }
 
 void ArrayView::Empty() {

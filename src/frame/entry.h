@@ -152,6 +152,7 @@ class ArrayView {
     }
 
     int32_t ResizeTo(const int32_t* dimensions);
+    void DeclareAs(const int32_t* dimensions);
     void Fill(const void* elements);
 
     void* data_ = nullptr;  // the elements, once mapped
@@ -238,6 +239,13 @@ class WritableView : public ShapedView<T, Rank> {
     [[nodiscard]] int32_t Resize(Dimensions... dimensions) requires(sizeof...(Dimensions) == Rank) {
         const int32_t wanted[Rank] = {dimensions...};
         return this->ResizeTo(wanted);
+    }
+
+    // Stores dimension words for a block that is known to be long enough, without asking the host.
+    template <class... Dimensions>
+    void Declare(Dimensions... dimensions) requires(sizeof...(Dimensions) == Rank) {
+        const int32_t wanted[Rank] = {dimensions...};
+        this->DeclareAs(wanted);
     }
 
     // Copies all elements from elsewhere, without mapping.
