@@ -2,6 +2,7 @@
 #ifndef KRNUMER_KRNUMER_H
 #define KRNUMER_KRNUMER_H
 
+#include <krnumer/anova.h>
 #include <krnumer/binding.h>
 #include <krnumer/distributions.h>
 #include <krnumer/filter.h>
