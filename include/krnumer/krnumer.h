@@ -5,6 +5,7 @@
 #include <krnumer/anova.h>
 #include <krnumer/binding.h>
 #include <krnumer/distributions.h>
+#include <krnumer/fft.h>
 #include <krnumer/filter.h>
 #include <krnumer/gen.h>
 #include <krnumer/linalg.h>

@@ -15,7 +15,7 @@ void ExpandHalfComplex(Complex* data, int32_t n, int32_t shift) {
         data[n - k] = {re, -im};
     }
     if (n % 2 == 0) data[n / 2].im = 0.0;
-    if (shift != 0) std::rotate(data, data + (n - n / 2), data + n);
+    if (shift != 0) ShiftSpectrum(data, n);
 }
 
 void PackHalfComplex(const Complex* data, int32_t n, int32_t shift, double* out, int32_t stride) {
@@ -27,6 +27,14 @@ void PackHalfComplex(const Complex* data, int32_t n, int32_t shift, double* out,
         out[n - k] = origin[k * step].im;
     }
     if (n % 2 == 0) out[n / 2] = data[shift != 0 ? 0 : n / 2 * step].re;
+}
+
+void ShiftSpectrum(Complex* data, int32_t n) {
+    std::rotate(data, data + (n - n / 2), data + n);
+}
+
+void CopyUnshifted(const Complex* shifted, int32_t n, Complex* out) {
+    std::rotate_copy(shifted, shifted + n / 2, shifted + n, out);
 }
 
 }  // namespace krnumer

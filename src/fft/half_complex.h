@@ -1,6 +1,6 @@
-// Spectra of real sequences in their two forms, n doubles of half-complex form and n complex values.
+// Spectra in their forms: half-complex or full, with X[0] first or in the middle.
 //
-// A shifted spectrum has X[0] at index n/2 (rounded down); for even n the Nyquist term stands at index 0.
+// A shifted spectrum of n values has X[0] at index n/2 (rounded down); for even n the Nyquist term stands at index 0.
 #pragma once
 
 #include <cstdint>
@@ -12,8 +12,14 @@ namespace krnumer {
 // Half-complex values in the real parts of `data` become the full spectrum, in place.
 void ExpandHalfComplex(Complex* data, int32_t n, int32_t shift);
 
-// The half-complex form of a spectrum. One half is read, and of X[0] and the Nyquist term the real part.
-// `stride` is the distance of the values in complex numbers.
+// The half-complex form of a spectrum whose values stand `stride` complex numbers apart. One half is read, and of X[0]
+// and of the Nyquist term the real part.
 void PackHalfComplex(const Complex* data, int32_t n, int32_t shift, double* out, int32_t stride = 1);
+
+// Shifts a spectrum in place.
+void ShiftSpectrum(Complex* data, int32_t n);
+
+// Copies a shifted spectrum with X[0] first.
+void CopyUnshifted(const Complex* shifted, int32_t n, Complex* out);
 
 }  // namespace krnumer

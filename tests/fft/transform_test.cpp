@@ -1,11 +1,11 @@
 #include <gtest/gtest.h>
 
 #include <cmath>
-#include <random>
 #include <vector>
 
 #include "fft/fft.h"
 #include "fft/long_dft.h"
+#include "fft/samples.h"
 #include "fft/table.h"
 #include "frame/complex.h"
 #include "frame/status.h"
@@ -41,30 +41,6 @@ class StridedArray {
     std::vector<double> data_;
 };
 
-std::vector<Complex> RandomComplex(int32_t n, uint64_t seed = 1) {
-    std::mt19937_64 engine(seed + static_cast<uint64_t>(n) * 1000);
-    std::normal_distribution<double> normal;
-    std::vector<Complex> x(static_cast<size_t>(n));
-    for (Complex& z : x) z = {normal(engine), normal(engine)};
-    return x;
-}
-
-std::vector<double> RandomReal(int32_t n) {
-    std::vector<double> x;
-    for (Complex z : RandomComplex(n)) x.push_back(z.re);
-    return x;
-}
-
-std::vector<LongComplex> ReferenceOf(const std::vector<Complex>& x) {
-    std::vector<LongComplex> z;
-    for (Complex value : x) z.emplace_back(value.re, value.im);
-    return LongDft(z);
-}
-
-std::vector<LongComplex> ReferenceOf(const std::vector<double>& x) {
-    return LongDft({x.begin(), x.end()});
-}
-
 std::vector<Complex> Transform(const std::vector<Complex>& x, bool inverse = false) {
     const auto n = static_cast<int32_t>(x.size());
     const HeldTable table(n);
@@ -99,22 +75,6 @@ std::vector<Complex> Expanded(const std::vector<double>& half_complex) {
         if (k > 0) full[n - k] = {half_complex[k], -im};
     }
     return full;
-}
-
-// Root of the mean squared error over the root of the mean square.
-double RelativeError(const std::vector<Complex>& actual, const std::vector<LongComplex>& expected) {
-    long double error = 0, size = 0;
-    for (size_t k = 0; k < expected.size(); ++k) {
-        error += std::norm(expected[k] - LongComplex(actual[k].re, actual[k].im));
-        size += std::norm(expected[k]);
-    }
-    return static_cast<double>(std::sqrt(error / size));
-}
-
-double RelativeError(const std::vector<Complex>& actual, const std::vector<Complex>& expected) {
-    std::vector<LongComplex> z;
-    for (Complex value : expected) z.emplace_back(value.re, value.im);
-    return RelativeError(actual, z);
 }
 
 bool HasOnlyFactors(int32_t n, std::initializer_list<int32_t> primes) {
