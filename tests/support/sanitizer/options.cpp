@@ -15,4 +15,13 @@ __attribute__((visibility("default"))) const char* __ubsan_default_options() {
     return "print_stacktrace=1";
 }
 
+__attribute__((visibility("default"))) const char* __lsan_default_options() {
+    return "print_suppressions=0";
+}
+
+// What the loader keeps for itself. The sanitizer knows it by its caller, unless a test's own malloc stands between.
+__attribute__((visibility("default"))) const char* __lsan_default_suppressions() {
+    return "leak:_dl_map_object_deps\n";
+}
+
 }  // extern "C"
