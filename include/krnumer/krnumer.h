@@ -9,6 +9,7 @@
 #include <krnumer/filter.h>
 #include <krnumer/gen.h>
 #include <krnumer/linalg.h>
+#include <krnumer/measure.h>
 #include <krnumer/noise.h>
 #include <krnumer/special.h>
 #include <krnumer/stat.h>

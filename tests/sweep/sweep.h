@@ -22,6 +22,7 @@
 #include <vector>
 
 #include "frame/complex.h"
+#include "frame/status.h"
 #include "krrt/krrt.h"
 #include "sweep/allocator.h"
 
@@ -81,6 +82,9 @@ class Scene {
     // Some allocations only serve a convenience: without them the call still succeeds, with other results.
     void SurvivesRefusedAllocation() { survives_refusal_ = true; }
 
+    // The status of a call whose memory is refused, where it is not -20001.
+    void RefusalGives(int32_t status) { refusal_status_ = status; }
+
     // Makes the call, under the pressure of this pass.
     template <class Function>
     int32_t Call(Function&& function) {
@@ -97,6 +101,7 @@ class Scene {
     int32_t status() const { return status_; }
     int32_t result() const { return result_; }
     bool survives_refusal() const { return survives_refusal_; }
+    int32_t refusal_status() const { return refusal_status_; }
 
     // The outputs, printable and comparable to the bit.
     std::string Results() const;
@@ -125,6 +130,7 @@ class Scene {
     int32_t err_ = 0x5A5A5A5A;
     bool err_asked_ = false;
     bool survives_refusal_ = false;
+    int32_t refusal_status_ = krnumer::kOutOfMemory;
     int32_t refused_allocation_;
     int32_t result_ = 0;
     int32_t status_ = 0;

@@ -56,7 +56,7 @@ class ExportSweep : public testing::TestWithParam<Entry> {
             if (scene.status() >= 0) {
                 EXPECT_TRUE(scene.survives_refusal()) << "succeeded without its memory";
             } else {
-                EXPECT_EQ(scene.status(), krnumer::kOutOfMemory);
+                EXPECT_EQ(scene.status(), scene.refusal_status());
                 EXPECT_EQ(scene.NotCleared(), "");
             }
             KrrtCloseInstance(nullptr);
