@@ -226,4 +226,145 @@ KRNUMER_API void KR_CoshI(double x, double* out);
  */
 KRNUMER_API void KR_SinhI(double x, double* out);
 
+/**
+ * Elliptic integral of the first kind, F(x | m) = integral of 1 / sqrt(1 - m sin^2 t) from 0 to x, or the complete one,
+ * K(m) = F(pi/2 | m).
+ *
+ * K: a polynomial pair in 1 - m, and ln 4 - ln(1 - m) / 2 from 1 - m = 7e-6 down. Relative error 2 eps, in the latter
+ * range 1.5e-6 at its edge, 2e-9 at 1e-8. F: descending Landen transformation within a quarter period, relative error 4
+ * eps; beyond a quarter multiples of K are added, with the error of K.
+ *
+ * K(1) is +infinity, and so is F(x | 1) beyond a quarter period, with the sign of x. NaN for m outside 0 to 1, for
+ * infinite arguments, and for |x| above 3.3e9.
+ *
+ * @param[in]  m    parameter, k^2, 0 to 1
+ * @param[in]  x    NaN for K(m); otherwise the amplitude in radians
+ * @param[out] out  K(m) or F(x | m)
+ */
+KRNUMER_API void KR_Elliptic1(double m, double x, double* out);
+
+/**
+ * Elliptic integral of the second kind, E(x | m) = integral of sqrt(1 - m sin^2 t) from 0 to x, or the complete one,
+ * E(m) = E(pi/2 | m).
+ *
+ * E(m): a polynomial pair in 1 - m, relative error 2 eps. E(x | m): the Landen transformation of KR_Elliptic1 without
+ * reduction, relative error 8 eps; it stands on K(m), whose error gives 5e-7 from 1 - m = 7e-6 down. NaN for m outside
+ * 0 to 1, for infinite arguments, and for |x| above 3.3e9 unless m is 0.
+ *
+ * @param[in]  m    parameter, k^2, 0 to 1
+ * @param[in]  x    NaN for E(m); otherwise the amplitude in radians
+ * @param[out] out  E(m) or E(x | m)
+ */
+KRNUMER_API void KR_Elliptic2(double m, double x, double* out);
+
+/**
+ * Jacobian elliptic functions sn, cn and dn of u, and the amplitude phi, F(phi | m) = u.
+ *
+ * Arithmetic-geometric mean; expansions of first order in m below 1e-9 and in 1 - m from 0.999999999 on, the latter for
+ * |u| below K(m). Absolute error 1e-14 for |u| up to 20. Beyond |u| = 355 the latter gives the limits +-1, 0 and 0.
+ * Outside 0 <= m <= 1 all results are 0; they are NaN for infinite or NaN arguments.
+ *
+ * @param[in]  u    argument
+ * @param[in]  m    parameter, k^2, 0 to 1
+ * @param[out] sn   sine of the amplitude
+ * @param[out] cn   cosine of the amplitude
+ * @param[out] dn   sqrt(1 - m sn^2)
+ * @param[out] phi  amplitude in radians; may be null
+ */
+KRNUMER_API void KR_EllipticJ(double u, double m, double* sn, double* cn, double* dn, double* phi);
+
+/**
+ * Gauss's hypergeometric function, 2F1(a, b; c; x).
+ *
+ * Power series of at most 200 terms, directly or after a transformation to x / (x - 1) below -0.5, to 1 - x above 0.9
+ * (with the psi function where c - a - b is an integer), by Euler's transformation where it ends the series, or by
+ * recurrence from larger c. Relative error 1e-13 for parameters up to 5, 1e-11 up to 30.
+ *
+ * +infinity for |x| above 1 unless a or b is 0 or a negative integer, at x = 1 for c - a - b <= 0, and for c = 0, -1,
+ * ... unless a or b ends the series before. Within 2^-28 a parameter counts as an integer. NaN for arguments that are
+ * not finite and where parameters above 1e6 would have to be recurred that often.
+ *
+ * @param[in]  x    argument
+ * @param[in]  a    first numerator parameter
+ * @param[in]  b    second numerator parameter
+ * @param[in]  c    denominator parameter
+ * @param[out] out  2F1(a, b; c; x)
+ */
+KRNUMER_API void KR_Gauss(double x, double a, double b, double c, double* out);
+
+/**
+ * Kummer's confluent hypergeometric function, M(a, b, x) = 1F1(a; b; x).
+ *
+ * Power series of at most 200 terms; for |x| from 30 on, where that is doubtful, an asymptotic form if its own estimate
+ * of error is the smaller; e^x M(b - a, b, -x) where b is within a relative 2^-13 of a. Relative error 1e-12 for x
+ * above 0 and parameters up to 6. For negative x the series cancels: absolute error 1e-7 at -12, relative error of
+ * M(1.5, 2.5, x) 2e-10 at -15, 4e-8 at -20, 2e-4 at -29.9 and 1e-12 from -30 down.
+ *
+ * +infinity for b = 0, -1, ... unless a ends the series before; an infinity with the sign of the leading term at x =
+ * +infinity. NaN for infinite a or b, unless a = b and x = +infinity.
+ *
+ * @param[in]  x    argument
+ * @param[in]  a    numerator parameter
+ * @param[in]  b    denominator parameter
+ * @param[out] out  M(a, b, x)
+ */
+KRNUMER_API void KR_Kummer(double x, double a, double b, double* out);
+
+/**
+ * Tricomi's confluent hypergeometric function, U(a, b, x), for x > 0.
+ *
+ * Below x = 6 from two functions M, relative error 1e-8; for b within 0.0005 of an integer n the mean of the values at
+ * n +- 0.0001, 1e-9 as a rule but up to 1e-3 off. From 6 on the asymptotic series up to its smallest term, with a
+ * correction for the rest (M. Abramowitz and I. A. Stegun, Handbook of Mathematical Functions, 1964, 13.1.3 and
+ * 13.5.2): 1e-15 above 40, 2e-5 between 15 and 40 for a and b up to 2, worse for smaller x and larger a: 24 % at U(3,
+ * 2, 6).
+ *
+ * +infinity at x = 0; NaN for x < 0 and for arguments that are not finite.
+ *
+ * @param[in]  x    x > 0
+ * @param[in]  a    first parameter
+ * @param[in]  b    second parameter
+ * @param[out] out  U(a, b, x)
+ */
+KRNUMER_API void KR_Tricomi(double x, double a, double b, double* out);
+
+/**
+ * Dilogarithm in Spence's form, Li2(1 - x) = integral of ln t / (1 - t) from 1 to x, for x >= 0.
+ *
+ * A rational approximation between 0.5 and 1.5, the functional equations elsewhere. Relative error 4e-15. NaN for x < 0
+ * and infinite x.
+ *
+ * @param[in]  x    x >= 0
+ * @param[out] out  Li2(1 - x)
+ */
+KRNUMER_API void KR_Diln(double x, double* out);
+
+/**
+ * Parabolic cylinder function in Whittaker's form, D_v(x).
+ *
+ * The even and the odd solution by their power series (M. Abramowitz and I. A. Stegun, Handbook of Mathematical
+ * Functions, 1964, 19.2 and 19.3), with gamma functions by a short Stirling series: each solution is good to 5e-9. For
+ * x > 0 they cancel: the relative error is 1e-7 at D_0.5(4), 1e-3 at 6, and no digit is left at 8.
+ *
+ * 0 at x = +infinity. At x = -infinity: +infinity for v < 0, 0 for integers v >= 0, otherwise -infinity where the whole
+ * part of v is even and +infinity where it is odd; NaN for v = +infinity. NaN where a part overflows.
+ *
+ * @param[in]  x    argument
+ * @param[in]  v    order
+ * @param[out] out  D_v(x)
+ */
+KRNUMER_API void KR_ParabolicCylinder(double x, double v, double* out);
+
+/**
+ * Riemann's zeta function, zeta(x), for real x.
+ *
+ * A table for integers up to 30, rational approximations up to 50, the sum over odd numbers up to 127, where it is 1.
+ * Relative error 5 eps. Negative x by reflection: relative error 3e-14, but 1e-13 absolute at the zeros -2, -4, ...,
+ * and 0 below -30.8148. +infinity at 1, 1 at +infinity, NaN at -infinity.
+ *
+ * @param[in]  x    any
+ * @param[out] out  zeta(x)
+ */
+KRNUMER_API void KR_Zeta(double x, double* out);
+
 #endif

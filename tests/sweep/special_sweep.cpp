@@ -72,3 +72,35 @@ SWEEP(KR_CoshI) {
 SWEEP(KR_SinhI) {
     return Plain(scene, KR_SinhI, 10.0);
 }
+
+SWEEP(KR_Elliptic1) {
+    return Plain(scene, KR_Elliptic1, 0.5, 1.0);
+}
+SWEEP(KR_Elliptic2) {
+    return Plain(scene, KR_Elliptic2, 0.5, 1.0);
+}
+SWEEP(KR_EllipticJ) {
+    double* const values = scene.Numbers(4);
+    return scene.Call([&] {
+        KR_EllipticJ(1.5, 0.6, values, values + 1, values + 2, values + 3);
+        return 0;
+    });
+}
+SWEEP(KR_Gauss) {
+    return Plain(scene, KR_Gauss, 0.95, 1.3, 0.7, 2.6);
+}
+SWEEP(KR_Kummer) {
+    return Plain(scene, KR_Kummer, 3.0, 1.5, 2.5);
+}
+SWEEP(KR_Tricomi) {
+    return Plain(scene, KR_Tricomi, 2.0, 0.7, 1.3);
+}
+SWEEP(KR_Diln) {
+    return Plain(scene, KR_Diln, 1.7);
+}
+SWEEP(KR_ParabolicCylinder) {
+    return Plain(scene, KR_ParabolicCylinder, 1.0, 0.5);
+}
+SWEEP(KR_Zeta) {
+    return Plain(scene, KR_Zeta, 3.5);
+}

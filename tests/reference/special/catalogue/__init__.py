@@ -80,6 +80,6 @@ def every(*draws):
 
 
 def functions():
-    from . import gamma, integrals
+    from . import elliptic, gamma, hypergeometric, integrals
 
-    return [f for family in (gamma, integrals) for f in family.FUNCTIONS]
+    return [f for family in (gamma, integrals, elliptic, hypergeometric) for f in family.FUNCTIONS]

@@ -83,6 +83,7 @@ FUNCTIONS = [
     ]),
     Function("sin_integral", "Si(x)", "KR_SinI", "d", mp.si, SINE + [Region("negative", uniform(-20.0, 0.0))]),
     Function("cos_integral", "Ci(x)", "KR_CosI", "d", mp.ci, SINE),
-    Function("sinh_integral", "Shi(x)", "KR_SinhI", "d", mp.shi, HYPERBOLIC + [Region("negative", uniform(-30.0, 0.0))]),
+    Function("sinh_integral", "Shi(x)", "KR_SinhI", "d", mp.shi,
+             HYPERBOLIC + [Region("negative", uniform(-30.0, 0.0))]),
     Function("cosh_integral", "Chi(x)", "KR_CoshI", "d", mp.chi, HYPERBOLIC),
 ]

@@ -1,0 +1,111 @@
+#include "special/elliptic.h"
+
+#include <cmath>
+
+#include "special/domain.h"
+#include "special/elliptic_coefficients.h"
+#include "special/polynomial.h"
+
+namespace krnumer {
+namespace {
+
+constexpr double kHalfPi = 1.5707963267948966;
+constexpr double kMostQuarters = 2147483648.0;  // quarter periods are counted in 32 bits
+
+double Signed(double size, double sign_of) {
+    return sign_of < 0.0 ? -size : size;
+}
+
+// How many half periods lie between 0 and phi >= 0, to the nearest.
+double HalfPeriods(double phi) {
+    return std::floor((phi + kHalfPi) / kPi);
+}
+
+struct Landen {
+    double first;   // F(phi | m)
+    double second;  // what E(phi | m) has beyond F(phi | m) E(m) / K(m)
+};
+
+// Descending Landen transformation of phi >= 0, 0 < m < 1.
+Landen Descend(double phi, double m) {
+    double a = 1.0, b = std::sqrt(1.0 - m), c = std::sqrt(m);
+    double t = std::tan(phi), scale = 1.0, correction = 0.0;
+    double halves = phi <= kHalfPi ? 0.0 : HalfPeriods(phi);  // one unit below pi / 2 the sum would round up
+    while (std::abs(c / a) > kEpsilon) {
+        const double ratio = b / a;
+        phi = phi + std::atan(t * ratio) + halves * kPi;
+        halves = HalfPeriods(phi);
+        t = t * (1.0 + ratio) / (1.0 - ratio * t * t);
+        c = (a - b) / 2.0;
+        const double mean = std::sqrt(a * b);
+        a = (a + b) / 2.0;
+        b = mean;
+        scale += scale;
+        correction += c * std::sin(phi);
+    }
+    return {(std::atan(t) + halves * kPi) / (scale * a), correction};
+}
+
+bool InDomain(double m) {
+    return m >= 0.0 && m <= 1.0;
+}
+
+}  // namespace
+
+double EllipticK(double m) {
+    if (!std::isfinite(m)) return kQuietNaN;
+    if (!InDomain(m)) return DomainError(kQuietNaN);
+    if (m == 1.0) return DomainError(kInfinity);
+    const double t = 1.0 - m;
+    if (t <= 7e-06) return 1.3862943611198906 - 0.5 * std::log(t);
+    return PolyEval(t, kEllipticKP) - std::log(t) * PolyEval(t, kEllipticKQ);
+}
+
+double EllipticE(double m) {
+    if (!std::isfinite(m)) return kQuietNaN;
+    if (!InDomain(m)) return DomainError(kQuietNaN);
+    const double t = 1.0 - m;
+    if (t == 0.0) return 1.0;
+    return PolyEval(t, kEllipticEP) - std::log(t) * t * PolyEval(t, kEllipticEQ);
+}
+
+double EllipticF(double phi, double m) {
+    if (!std::isfinite(phi) || !std::isfinite(m)) return kQuietNaN;
+    if (!InDomain(m)) return DomainError(kQuietNaN);
+    const double size = std::abs(phi);
+    if (size > kHalfPi) {
+        const double quarters = size / kHalfPi;
+        if (quarters >= kMostQuarters) return kQuietNaN;
+        if (m == 1.0) return Signed(kInfinity, phi);
+        const double whole = std::floor(quarters);
+        const double even = whole + std::fmod(whole, 2.0);
+        return Signed(even * EllipticK(m) + EllipticF((quarters - even) * kHalfPi, m), phi);
+    }
+    if (phi == 0.0) return 0.0;
+    if (m == 0.0) return phi;
+    if (std::abs(size - kHalfPi) < kEpsilon) return Signed(EllipticK(m), phi);
+    if (m == 1.0) return Signed(std::log(std::tan((size + kHalfPi) / 2.0)), phi);
+    return Signed(Descend(size, m).first, phi);
+}
+
+double EllipticE(double phi, double m) {
+    if (!std::isfinite(phi) || !std::isfinite(m)) return kQuietNaN;
+    if (!InDomain(m)) return DomainError(kQuietNaN);
+    if (m == 0.0) return phi;
+    const double size = std::abs(phi);
+    const double quarters = size / kHalfPi;
+    if (quarters >= kMostQuarters) return kQuietNaN;
+    if (m == 1.0) {
+        const double halves = HalfPeriods(size);
+        return Signed(std::sin(size - halves * kPi) + 2.0 * halves, phi);
+    }
+    constexpr double kNear = 8.881784197001252e-16;
+    const double fraction = quarters - std::floor(quarters);
+    if (fraction < kNear * quarters || 1.0 - fraction < kNear * quarters) {
+        return Signed(EllipticE(m) * quarters, phi);
+    }
+    const Landen landen = Descend(size, m);
+    return Signed(EllipticE(m) / EllipticK(m) * landen.first + landen.second, phi);
+}
+
+}  // namespace krnumer
