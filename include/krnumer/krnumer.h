@@ -12,8 +12,10 @@
 #include <krnumer/measure.h>
 #include <krnumer/noise.h>
 #include <krnumer/special.h>
+#include <krnumer/spectrum.h>
 #include <krnumer/stat.h>
 #include <krnumer/status.h>
+#include <krnumer/transform.h>
 #include <krnumer/types.h>
 #include <krnumer/window.h>
 

@@ -1,0 +1,54 @@
+// Moving sums that go on from block to block, for filters before a decimation (E. B. Hogenauer, IEEE Trans. ASSP 29,
+// 155, 1981). Neither divides by its window.
+#pragma once
+
+#include <cstdint>
+
+#include "frame/numeric.h"
+
+namespace krnumer {
+
+// Runs x[0..n) through `stages` moving sums of width `window`, one after the other, in place. `sums` holds the sum of
+// each stage, a row of `history` its last inputs as a ring, in which `index` is the position of the next one; a
+// position of `window` counts as 0. What a sum has once taken in leaves it by subtraction only, so a NaN stays.
+template <class T>
+void CascadedMovingSums(T* x, int32_t n, int32_t stages, int32_t window, T* sums, T* history, int32_t* index) {
+    if (n < 1 || window < 1) return;
+    const int32_t first = *index < window ? *index : 0;
+    for (int32_t stage = 0; stage < stages; ++stage) {
+        T* const ring = history + Count(stage) * Count(window);
+        T sum = sums[stage];
+        int32_t position = first;
+        for (int32_t i = 0; i < n; ++i) {
+            const T change = x[i] - ring[position];
+            ring[position] = x[i];
+            sum += change;
+            x[i] = sum;
+            if (++position == window) position = 0;
+        }
+        sums[stage] = sum;
+    }
+    *index = static_cast<int32_t>((std::int64_t{first} + n) % window);
+}
+
+// Sums x[0..n) in blocks of `width` samples, from 2 on; the sums take the place of the first samples, and their number
+// is returned. `sum` and `count`, below `width`, are those of the block that is still open.
+template <class T>
+int32_t DecimatedMovingSums(T* x, int32_t n, int32_t width, T* sum, int32_t* count) {
+    const auto outputs = static_cast<int32_t>((std::int64_t{*count} + n) / width);
+    T open = *sum;
+    int32_t held = *count;
+    int32_t next = 0;
+    for (int32_t k = 0; k < outputs; ++k) {
+        for (; held < width; ++held) open += x[next++];
+        x[k] = open;
+        open = T{};
+        held = 0;
+    }
+    for (; next < n; ++held) open += x[next++];
+    *sum = open;
+    *count = held;
+    return outputs;
+}
+
+}  // namespace krnumer
