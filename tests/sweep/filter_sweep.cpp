@@ -5,7 +5,8 @@
 namespace {
 
 const double kFs = 1000.0, kFl = 50.0, kFh = 120.0, kRipple = 1.0, kAttenuation = 40.0;
-const int32_t kOrder = 3, kBandpass = 2;
+const int32_t kOrder = 3, kBandpass = 2, kBiquads = 0;
+const uint8_t kContinue = 1;
 
 }  // namespace
 
@@ -36,4 +37,52 @@ SWEEP(EllipticCoefs) {
     return scene.Call([&] {
         return EllipticCoefs(&kFs, &kFl, &kFh, &kRipple, &kAttenuation, &kOrder, &kBandpass, a, b, scene.err());
     });
+}
+
+// States of other lengths than the filters ask for, so that they are resized.
+SWEEP(IIR_Filter) {
+    const KrHandle x = scene.Replaced(scene.Doubles({1, 2, 3, 4})), a = scene.Doubles({1, -0.5, 0.25}),
+                   b = scene.Doubles({1, 2}), forward = scene.Replaced(scene.Doubles({1, 2, 3})),
+                   reverse = scene.Replaced(scene.Doubles({1}));
+    return scene.Call([&] { return IIR_Filter(x, a, b, forward, reverse, &kContinue, scene.err()); });
+}
+
+SWEEP_MORE(IIR_Filter, continued) {
+    const KrHandle x = scene.Replaced(scene.Doubles({1, 2, 3, 4})), a = scene.Doubles({1, -0.5, 0.25}),
+                   b = scene.Doubles({1, 2}), forward = scene.Replaced(scene.Doubles({1})),
+                   reverse = scene.Replaced(scene.Doubles({1, 2}));
+    return scene.Call([&] { return IIR_Filter(x, a, b, forward, reverse, &kContinue, scene.err()); });
+}
+
+SWEEP(CxSigIIR_Filter) {
+    const KrHandle x = scene.Replaced(scene.Complexes({{1, 2}, {3, 4}})), a = scene.Doubles({1, -0.5, 0.25}),
+                   b = scene.Doubles({1, 2}), forward = scene.Replaced(scene.Complexes({})),
+                   reverse = scene.Replaced(scene.Complexes({{1, 1}}));
+    return scene.Call([&] { return CxSigIIR_Filter(x, a, b, forward, reverse, &kContinue, scene.err()); });
+}
+
+SWEEP(CxIIR_Filter_H) {
+    const KrHandle x = scene.Replaced(scene.Complexes({{1, 2}, {3, 4}})), a = scene.Complexes({{1, 0}, {0, -0.5}}),
+                   b = scene.Complexes({{1, 2}, {0, 1}}), forward = scene.Replaced(scene.Complexes({})),
+                   reverse = scene.Replaced(scene.Complexes({}));
+    return scene.Call([&] { return CxIIR_Filter_H(x, a, b, forward, reverse, &kContinue, scene.err()); });
+}
+
+SWEEP(CxIIRReSig_Filter_H) {
+    const KrHandle x = scene.Doubles({1, 2, 3}), y = scene.OutComplexes(), a = scene.Complexes({{1, 0}, {0, -0.5}}),
+                   b = scene.Complexes({{1, 2}, {0, 1}}), forward = scene.Replaced(scene.Doubles({})),
+                   reverse = scene.Replaced(scene.Complexes({}));
+    return scene.Call([&] { return CxIIRReSig_Filter_H(x, y, a, b, forward, reverse, &kContinue); });
+}
+
+SWEEP(IIR_Filter2) {
+    const KrHandle x = scene.Replaced(scene.Doubles({1, 2, 3, 4})), a = scene.Doubles({-0.5, 0.25}),
+                   b = scene.Doubles({1, 2, 1}), state = scene.Replaced(scene.Doubles({1}));
+    return scene.Call([&] { return IIR_Filter2(x, &kBiquads, a, b, state, &kContinue, scene.err()); });
+}
+
+SWEEP(CxSigIIR_Filter2) {
+    const KrHandle x = scene.Replaced(scene.Complexes({{1, 2}, {3, 4}})), a = scene.Doubles({-0.5, 0.25}),
+                   b = scene.Doubles({1, 2, 1}), state = scene.Replaced(scene.Complexes({{1, 2}}));
+    return scene.Call([&] { return CxSigIIR_Filter2(x, &kBiquads, a, b, state, &kContinue, scene.err()); });
 }
