@@ -18,5 +18,6 @@
 #include <krnumer/transform.h>
 #include <krnumer/types.h>
 #include <krnumer/window.h>
+#include <krnumer/zoom.h>
 
 #endif
