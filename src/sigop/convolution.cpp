@@ -4,42 +4,14 @@
 #include <bit>
 #include <type_traits>
 
-#include "fft/fft.h"
 #include "frame/scratch.h"
 #include "frame/status.h"
 #include "sigop/direct_convolution.h"
 #include "sigop/half_complex_arithmetic.h"
+#include "sigop/spectrum.h"
 
 namespace krnumer {
 namespace {
-
-// Spectra in the form that suits the element: half-complex of real data, full of complex data.
-
-int32_t Forward(const HeldTable& table, const double* x, double* spectrum, int32_t n) {
-    return RealFFT(table.get(), x, spectrum, 1, 1, n);
-}
-int32_t Forward(const HeldTable& table, const Complex* x, Complex* spectrum, int32_t n) {
-    return ComplexFFT(table.get(), &x->re, &x->im, &spectrum->re, &spectrum->im, 2, 2, n);
-}
-
-int32_t Inverse(const HeldTable& table, double* spectrum, double* x, int32_t n) {
-    return InverseRealFFT(table.get(), spectrum, x, 1, 1, n);
-}
-int32_t Inverse(const HeldTable& table, const Complex* spectrum, Complex* x, int32_t n) {
-    return InverseComplexFFT(table.get(), &spectrum->re, &spectrum->im, &x->re, &x->im, 2, 2, n);
-}
-
-void Multiply(const double* a, const double* b, double* out, int32_t n) {
-    HalfComplexMultiply(a, b, out, n);
-}
-void Multiply(const Complex* a, const Complex* b, Complex* out, int32_t n) {
-    for (int32_t k = 0; k < n; ++k) out[k] = a[k] * b[k];
-}
-
-template <class T>
-void CopyPadded(const T* x, int32_t nx, T* padded, int32_t n) {
-    std::fill(std::copy_n(x, nx, padded), padded + n, T{});
-}
 
 template <class T>
 int32_t ConvolveSpectra(const T* x, int32_t nx, const T* y, int32_t ny, T* z) {
@@ -54,7 +26,7 @@ int32_t ConvolveSpectra(const T* x, int32_t nx, const T* y, int32_t ny, T* z) {
     CopyPadded(y, ny, b, n);
     if (const int32_t status = Forward(table, a, c, n)) return status;
     if (const int32_t status = Forward(table, b, a, n)) return status;
-    Multiply(c, a, b, n);
+    MultiplySpectra(c, a, b, n);
     if (const int32_t status = Inverse(table, b, a, n)) return status;
     std::copy_n(a, FullLength(nx, ny), z);
     return kOk;
@@ -104,19 +76,12 @@ int32_t Autocorrelate(const double* x, int32_t nx, double* z) {
     return kOk;
 }
 
-double ConjugateOf(double x) {
-    return x;
-}
-Complex ConjugateOf(Complex x) {
-    return Conjugate(x);
-}
-
 template <class T>
 int32_t ConvolveReversed(const T* x, int32_t nx, const T* y, int32_t ny, int32_t algorithm, T* z) {
     if (nx < 1 || ny < 1) return kEmptyInput;
     Scratch<T> reversed(Count(nx));
     if (!reversed) return kOutOfMemory;
-    for (int32_t i = 0; i < nx; ++i) reversed[Count(i)] = ConjugateOf(x[nx - 1 - i]);
+    CopyReversed(x, Count(nx), reversed.data());
     return Convolve(y, ny, reversed.data(), nx, algorithm, z);
 }
 

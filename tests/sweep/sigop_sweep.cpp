@@ -1,0 +1,129 @@
+#include "krnumer/sigop.h"
+
+#include <vector>
+
+#include "sweep/sweep.h"
+
+namespace {
+
+using krnumer::Complex;
+using sweep::Scene;
+
+const std::vector<double> kReal{1, -2, 3.5, 4, -5, 0.5, 7};
+const std::vector<double> kKernel{0.5, -1, 2};
+const std::vector<Complex> kComplex{{1, -1}, {2, 0}, {3, 1}, {4, 4}, {5, -2}, {6, 0}};
+const std::vector<Complex> kComplexKernel{{0.5, 1}, {-1, 0}, {2, -3}};
+
+constexpr int32_t kDirect = 0;
+constexpr int32_t kFrequencyDomain = 1;
+
+}  // namespace
+
+namespace {
+
+int32_t PlayConvolution(Scene& scene, int32_t algorithm) {
+    const KrHandle x = scene.Doubles(kReal);
+    const KrHandle y = scene.Doubles(kKernel);
+    const KrHandle z = scene.OutDoubles();
+    return scene.Call([&] { return Convolution(x, y, z, &algorithm, scene.err()); });
+}
+
+int32_t PlayComplexConvolution(Scene& scene, int32_t algorithm, int32_t correlate) {
+    const KrHandle x = scene.Complexes(kComplex);
+    const KrHandle y = scene.Complexes(kComplexKernel);
+    const KrHandle z = scene.OutComplexes();
+    return scene.Call([&] { return CxConvolution(x, y, z, algorithm, correlate, 1); });
+}
+
+int32_t PlayCorrelation(Scene& scene, int32_t algorithm, const std::vector<double>& second) {
+    const KrHandle x = scene.Doubles(kReal);
+    const KrHandle y = second.empty() ? x : scene.Doubles(second);
+    const KrHandle z = scene.OutDoubles();
+    return scene.Call([&] { return Rxy80(x, y, z, &algorithm, 2, scene.err()); });
+}
+
+// A failure while computing leaves the dimensions.
+int32_t PlayPlanes(Scene& scene, int32_t part, int32_t algorithm) {
+    const KrHandle x = scene.Matrix(3, 3, {1, 2, 3, 4, -5, 6, 7, 8, 9});
+    const KrHandle y = scene.Matrix(2, 2, {1, -1, 2, 0.5});
+    const KrHandle z = scene.OutMatrix(sweep::OnFailure::kOther);
+    return scene.Call([&] { return Convolve_2DH(x, y, z, part, algorithm); });
+}
+
+int32_t PlayComplexPlanes(Scene& scene, int32_t part, int32_t algorithm) {
+    const KrHandle x = scene.ComplexMatrix(3, 2, {{1, 2}, {3, 4}, {-5, 6}, {7, 8}, {9, 0}, {2, -3}});
+    const KrHandle y = scene.ComplexMatrix(2, 1, {{1, -1}, {2, 0.5}});
+    const KrHandle z = scene.OutComplexMatrix(sweep::OnFailure::kOther);
+    return scene.Call([&] { return CxConvolve_2DH(x, y, z, part, algorithm); });
+}
+
+}  // namespace
+
+SWEEP(Convolution) {
+    return PlayConvolution(scene, kFrequencyDomain);
+}
+SWEEP_MORE(Convolution, direct) {
+    return PlayConvolution(scene, kDirect);
+}
+SWEEP(CxConvolution) {
+    return PlayComplexConvolution(scene, kFrequencyDomain, 0);
+}
+SWEEP_MORE(CxConvolution, direct) {
+    return PlayComplexConvolution(scene, kDirect, 0);
+}
+SWEEP_MORE(CxConvolution, correlation) {
+    return PlayComplexConvolution(scene, kFrequencyDomain, 1);
+}
+SWEEP(Rxy) {
+    const KrHandle x = scene.Doubles(kReal);
+    const KrHandle y = scene.Doubles(kKernel);
+    const KrHandle z = scene.OutDoubles();
+    return scene.Call([&] { return Rxy(x, y, z, &kFrequencyDomain, scene.err()); });
+}
+SWEEP(Rxy80) {
+    return PlayCorrelation(scene, kFrequencyDomain, kKernel);
+}
+SWEEP_MORE(Rxy80, direct) {
+    return PlayCorrelation(scene, kDirect, kKernel);
+}
+SWEEP_MORE(Rxy80, with_itself) {
+    return PlayCorrelation(scene, kFrequencyDomain, {});
+}
+SWEEP(AutoCorrelation) {
+    const KrHandle x = scene.Replaced(scene.Doubles(kReal));
+    return scene.Call([&] { return AutoCorrelation(x, scene.err()); });
+}
+SWEEP(AutoCorrelation80) {
+    const KrHandle x = scene.Replaced(scene.Doubles(kReal));
+    return scene.Call([&] { return AutoCorrelation80(x, 1, scene.err()); });
+}
+SWEEP(Deconvolution) {
+    const KrHandle x = scene.Replaced(scene.Doubles(kReal));
+    const KrHandle y = scene.Doubles(kKernel);
+    scene.SurvivesRefusedAllocation();  // the tables of the transform
+    return scene.Call([&] { return Deconvolution(x, y, scene.err()); });
+}
+SWEEP(Convolve_2DH) {
+    return PlayPlanes(scene, 0, kFrequencyDomain);
+}
+SWEEP_MORE(Convolve_2DH, direct_valid) {
+    return PlayPlanes(scene, 2, kDirect);
+}
+SWEEP(CxConvolve_2DH) {
+    return PlayComplexPlanes(scene, 1, kFrequencyDomain);
+}
+SWEEP_MORE(CxConvolve_2DH, direct_valid) {
+    return PlayComplexPlanes(scene, 2, kDirect);
+}
+SWEEP(Correlation_2DH) {
+    const KrHandle x = scene.Matrix(2, 3, {1, 2, 3, 4, -5, 6});
+    const KrHandle y = scene.Matrix(2, 2, {1, -1, 2, 0.5});
+    const KrHandle z = scene.OutMatrix();
+    return scene.Call([&] { return Correlation_2DH(x, y, z, kFrequencyDomain); });
+}
+SWEEP(CxCorrelation_2DH) {
+    const KrHandle x = scene.ComplexMatrix(2, 2, {{1, 2}, {3, 4}, {-5, 6}, {7, 8}});
+    const KrHandle y = scene.ComplexMatrix(1, 2, {{1, -1}, {2, 0.5}});
+    const KrHandle z = scene.OutComplexMatrix();
+    return scene.Call([&] { return CxCorrelation_2DH(x, y, z, kDirect); });
+}
