@@ -165,6 +165,12 @@ void ArrayView::Empty() {
     StoreDimensions(kNone);
 }
 
+int32_t ArrayView::Clear() {
+    if (const int32_t status = SeparateOthers()) return status;
+    Empty();
+    return kOk;
+}
+
 void ArrayView::ReleaseElements() {
     DropCopy();
     ResizeBlock(kind_.type_code, 0);

@@ -138,6 +138,10 @@ class ArrayView {
     // Resizes to no elements and stores 0 in the dimension words.
     void Empty();
 
+    // Empties an output before anything is looked at. -20001 when the block is that of an input as well, whose elements
+    // have to be put aside first, and they cannot be.
+    [[nodiscard]] int32_t Clear();
+
     // Resizes to no elements and leaves the dimension words as they are.
     void ReleaseElements();
 

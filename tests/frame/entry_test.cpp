@@ -166,6 +166,32 @@ TEST_F(Frame, ReadsAnInputThatIsReplacedFromACopy) {
     EXPECT_THAT(z.values(), ElementsAre(4, 6));
 }
 
+// Copies x to y, which is empty from the start.
+int32_t CopyIntoCleared(KrHandle x, KrHandle y) {
+    ByValue call;
+    In<double> input(call, x);
+    Out<double> output(call, y);
+    if (output.Clear()) return call.Fail(kOutOfMemory);
+    if (input.size() < 1) return call.Fail(kEmptyInput);
+    if (output.Resize(input.size())) return call.Fail(kOutOfMemory);
+    return call.Run([&] {
+        for (int32_t i = 0; i < input.size(); ++i) output.data()[i] = input.data()[i];
+        return kOk;
+    });
+}
+
+TEST_F(Frame, ClearsAnOutputFirst) {
+    const ResizeLog resizes;
+    EXPECT_EQ(CopyIntoCleared(x_.handle(), y_.handle()), 0);
+    EXPECT_THAT(y_.values(), ElementsAre(1, 2, 4));
+    ASSERT_EQ(resizes.size(), 2);
+    EXPECT_EQ(resizes[0].totalElements, 0);
+    EXPECT_EQ(CopyIntoCleared(x_.handle(), x_.handle()), 0) << "the elements are put aside";
+    EXPECT_THAT(x_.values(), ElementsAre(1, 2, 4));
+    EXPECT_EQ(CopyIntoCleared(HostArray<double>().handle(), y_.handle()), kEmptyInput);
+    EXPECT_THAT(y_.values(), IsEmpty());
+}
+
 // Drops all samples but the first `count`, after the core has doubled them.
 int32_t DoubleHead(KrHandle x, int32_t count, int32_t status = kOk, Access access = Access::kReplaced) {
     ByValue call;
