@@ -13,5 +13,6 @@
 #define KRNUMER_LINALG_H
 
 #include <krnumer/linalg_basic.h>
+#include <krnumer/linalg_eigen.h>
 
 #endif

@@ -2,10 +2,14 @@
 // a status. Each core is one template over the element; its complex form also goes by a name of its own.
 #pragma once
 
+#include "linalg/eigen_general.h"
+#include "linalg/eigen_polynomial.h"
+#include "linalg/eigen_symmetric.h"
 #include "linalg/finite.h"
 #include "linalg/packed.h"
 #include "linalg/products.h"
 #include "linalg/special_matrix.h"
+#include "linalg/svd.h"
 #include "linalg/transpose.h"
 
 namespace krnumer {
@@ -18,5 +22,7 @@ inline constexpr auto& CxConjTransposeCore = ConjTransposeCore<Complex>;
 inline constexpr auto& CxPackTriangle = PackTriangle<Complex>;
 inline constexpr auto& CxUnpackTriangle = UnpackTriangle<Complex>;
 inline constexpr auto& CxMakeSpecialMatrix = MakeSpecialMatrix<Complex>;
+inline constexpr auto& CxSvdCore = SvdCore<Complex>;
+inline constexpr auto& CxSvdValuesCore = SvdValuesCore<Complex>;
 
 }  // namespace krnumer

@@ -1,4 +1,4 @@
-// Checks of sizes as the entry points of linear algebra make them.
+// What the entry points of linear algebra have in common.
 #pragma once
 
 #include <cstdint>
@@ -25,6 +25,19 @@ bool IsNegative(const ShapedView<T, 2>& matrix) {
 template <class T>
 bool IsSquare(const ShapedView<T, 2>& matrix) {
     return matrix.rows() == matrix.columns();
+}
+
+// -20003 for a matrix without elements, -20040 for one that is not square. Both are tested, and the latter wins.
+template <class T>
+int32_t CheckSquare(const ShapedView<T, 2>& matrix) {
+    if (!IsSquare(matrix)) return kNotSquare;
+    return IsEmpty(matrix) ? kEmptyInput : kOk;
+}
+
+// Makes complex elements of the doubles that a core left in the first half of their array.
+inline void SpreadToComplex(Complex* elements, int32_t count) {
+    const double* values = reinterpret_cast<const double*>(elements);
+    for (int32_t i = count; i-- > 0;) elements[i] = {values[i], 0.0};
 }
 
 // The product of two sizes; false when it is none, or one that no dimension word holds.

@@ -18,6 +18,22 @@ struct Reflector {
     double h = 0.0;  // 0 where x was 0 and there is nothing to reflect
 };
 
+// a / |a|, and 1 for 0.
+inline Complex Phase(Complex a) {
+    const double modulus = Hypotenuse(a.re, a.im);
+    return modulus > 0.0 ? a / modulus : Complex{1.0, 0.0};
+}
+
+// What a reflector's image contributes to a condensed form that has to be real. For a complex image that is its
+// modulus, and `phase` is multiplied by the phase that it loses.
+inline double RealImage(double image, double* /*phase*/) {
+    return image;
+}
+inline double RealImage(Complex image, Complex* phase) {
+    *phase = Phase(image) * *phase;
+    return Hypotenuse(image.re, image.im);
+}
+
 // Overwrites x (count elements, `stride` apart) by v, scaled by the sum of magnitudes.
 template <class T>
 Reflector<T> MakeReflector(T* x, std::ptrdiff_t count, std::ptrdiff_t stride) {

@@ -24,12 +24,34 @@ inline double Hypotenuse(double a, double b) {
 
 // Vectors as consecutive rows of `length` doubles; no rows where only values are wanted.
 struct VectorRows {
+    VectorRows() = default;
+    template <class T>
+    VectorRows(T* elements, std::ptrdiff_t elements_per_row)
+        : rows(reinterpret_cast<double*>(elements)),
+          length(elements_per_row * static_cast<std::ptrdiff_t>(sizeof(T) / sizeof(double))) {}
+
     double* rows = nullptr;
     std::ptrdiff_t length = 0;
 
     explicit operator bool() const { return rows != nullptr; }
     double* operator[](std::ptrdiff_t i) const { return rows + i * length; }
 };
+
+// out (row-major, m by n) = the n rows of m elements as columns: row order[j] becomes column j.
+template <class T>
+void RowsToColumns(const T* rows, const std::ptrdiff_t* order, std::ptrdiff_t n, std::ptrdiff_t m, T* out) {
+    for (std::ptrdiff_t j = 0; j < n; ++j) {
+        const T* row = rows + order[j] * m;
+        for (std::ptrdiff_t i = 0; i < m; ++i) out[i * n + j] = row[i];
+    }
+}
+
+// out = the n columns of a (row-major, m by n) as rows.
+template <class T>
+void ColumnsToRows(const T* a, std::ptrdiff_t m, std::ptrdiff_t n, T* out) {
+    for (std::ptrdiff_t i = 0; i < m; ++i)
+        for (std::ptrdiff_t j = 0; j < n; ++j) out[j * m + i] = a[i * n + j];
+}
 
 // x' = x c + y s and y' = y c - x s on two rows.
 void RotateRows(double* x, double* y, std::ptrdiff_t length, double c, double s);

@@ -16,12 +16,6 @@ namespace krnumer {
 
 namespace {
 
-// a / |a|, and 1 for 0.
-Complex Phase(Complex a) {
-    const double modulus = Hypotenuse(a.re, a.im);
-    return modulus > 0.0 ? a / modulus : Complex{1.0, 0.0};
-}
-
 // The reduction of a tall matrix to a bidiagonal one, A = P H1 ... Hn B Gn-1 ... G1 Q^H. The vectors of the reflectors
 // H and G stay in the columns and rows of A; the diagonal unitary P and Q make a complex B real.
 template <class T>
@@ -39,18 +33,6 @@ struct Reduction {
 
     T* At(std::ptrdiff_t i, std::ptrdiff_t j) const { return a + i * n + j; }
 };
-
-// The real number that a reflector's image leaves in B. For a complex image that is its modulus, and its phase goes to
-// `phase`.
-template <class T>
-double RealImage(T image, [[maybe_unused]] T* phase) {
-    if constexpr (kIsComplex<T>) {
-        *phase = Phase(image) * *phase;
-        return Hypotenuse(image.re, image.im);
-    } else {
-        return image;
-    }
-}
 
 template <class T>
 void Bidiagonalise(const Reduction<T>& r) {
@@ -114,21 +96,6 @@ void AccumulateLeft(const Reduction<T>& r) {
     }
 }
 
-template <class T>
-void Transpose(const T* a, std::ptrdiff_t rows, std::ptrdiff_t columns, T* out) {
-    for (std::ptrdiff_t i = 0; i < rows; ++i)
-        for (std::ptrdiff_t j = 0; j < columns; ++j) out[j * rows + i] = a[i * columns + j];
-}
-
-// out = the n rows of length m, in the given order, as columns.
-template <class T>
-void TransposeInOrder(const T* rows, const std::ptrdiff_t* order, std::ptrdiff_t n, std::ptrdiff_t m, T* out) {
-    for (std::ptrdiff_t j = 0; j < n; ++j) {
-        const T* row = rows + order[j] * m;
-        for (std::ptrdiff_t i = 0; i < m; ++i) out[i * n + j] = row[i];
-    }
-}
-
 // Exchange sort into descending order; equal values stay where they are. Null order: values only.
 void SortDescending(double* w, std::ptrdiff_t n, std::ptrdiff_t* order) {
     for (std::ptrdiff_t i = 0; i < n; ++i) {
@@ -166,18 +133,17 @@ int32_t DecomposeTall(T* a, std::ptrdiff_t m, std::ptrdiff_t n, double* s, T* v)
     AccumulateLeft(reduction);
     T* left = elements(m * n);
     T* right = elements(n * n);
-    Transpose(a, m, n, left);
-    Transpose(v, n, n, right);
+    ColumnsToRows(a, m, n, left);
+    ColumnsToRows(v, n, n, right);
     double* rotations = doubles(4 * n);
-    const VectorRows left_rows{reinterpret_cast<double*>(left), kParts * m};
-    const VectorRows right_rows{reinterpret_cast<double*>(right), kParts * n};
-    if (const int32_t status = DiagonaliseBidiagonal(bidiagonal, left_rows, right_rows, rotations)) return status;
+    const int32_t status = DiagonaliseBidiagonal(bidiagonal, {left, m}, {right, n}, rotations);
+    if (status != kOk) return status;
 
     auto* order = reinterpret_cast<std::ptrdiff_t*>(doubles(n));
     std::iota(order, order + n, 0);
     SortDescending(s, n, order);
-    TransposeInOrder(left, order, n, m, a);
-    TransposeInOrder(right, order, n, n, v);
+    RowsToColumns(left, order, n, m, a);
+    RowsToColumns(right, order, n, n, v);
     return kOk;
 }
 

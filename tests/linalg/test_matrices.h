@@ -110,6 +110,47 @@ DenseMatrix<T> VandermondeMatrix(int32_t m, int32_t n) {
     });
 }
 
+// ---- Matrices of eigenproblem collections, by their formulas ------------------------------------------------------
+
+// Ill-conditioned eigenvalues in reciprocal pairs (W. L. Frank, J. SIAM 6, 378, 1958).
+inline DenseMatrix<double> FrankMatrix(int32_t n) {
+    return Generate<double>(n, n, [n](int32_t i, int32_t j) { return j + 1 < i ? 0.0 : n - std::max(i, j); });
+}
+
+// Tridiagonal with nearly equal pairs of eigenvalues.
+inline DenseMatrix<double> WilkinsonMatrix(int32_t n) {
+    return Generate<double>(n, n, [n](int32_t i, int32_t j) {
+        if (i == j) return std::fabs((n - 1) / 2.0 - i);
+        return std::abs(i - j) == 1 ? 1.0 : 0.0;
+    });
+}
+
+// Toeplitz, with very sensitive complex eigenvalues (J. Grcar, 1989).
+inline DenseMatrix<double> GrcarMatrix(int32_t n) {
+    return Generate<double>(n, n, [](int32_t i, int32_t j) {
+        if (i == j + 1) return -1.0;
+        return j >= i && j <= i + 3 ? 1.0 : 0.0;
+    });
+}
+
+// Tridiagonal with zero diagonal and eigenvalues n - 1, n - 3, ..., 1 - n (P. A. Clement, SIAM Review 1, 50, 1959).
+inline DenseMatrix<double> ClementMatrix(int32_t n) {
+    return Generate<double>(n, n, [n](int32_t i, int32_t j) {
+        if (j == i + 1) return static_cast<double>(n - j);
+        return i == j + 1 ? static_cast<double>(i) : 0.0;
+    });
+}
+
+// Double, small, zero and nearly equal eigenvalues (J. B. Rosser et al., J. Res. Nat. Bur. Standards 47, 291, 1951).
+inline DenseMatrix<double> RosserMatrix() {
+    DenseMatrix<double> a(8, 8);
+    a.elements = {611,  196, -192, 407, -8,  -52,  -49, 29,   196, 899,  113, -192, -71,  -43, -8,   -44,
+                  -192, 113, 899,  196, 61,  49,   8,   52,   407, -192, 196, 611,  8,    44,  59,   -23,
+                  -8,   -71, 61,   8,   411, -599, 208, 208,  -52, -43,  49,  44,   -599, 411, 208,  208,
+                  -49,  -8,  8,    59,  208, 208,  99,  -911, 29,  -44,  52,  -23,  208,  208, -911, 99};
+    return a;
+}
+
 template <class T>
 DenseMatrix<T> Product(const DenseMatrix<T>& a, const DenseMatrix<T>& b) {
     DenseMatrix<T> c(a.rows, b.columns);
@@ -161,6 +202,23 @@ double Unorthogonality(const DenseMatrix<T>& q) {
     const auto identity =
         Generate<T>(q.columns, q.columns, [](int32_t i, int32_t j) { return FromReal<T>(i == j ? 1.0 : 0.0); });
     return Distance(Product(Adjoint(q), q), identity);
+}
+
+// A Jordan block, hidden in a full matrix: L J L^-1 with the ones of a lower triangle, exact in small integers.
+inline DenseMatrix<double> JordanMatrix(int32_t n, double eigenvalue) {
+    const auto block = Generate<double>(
+        n, n, [eigenvalue](int32_t i, int32_t j) { return i == j ? eigenvalue : (j == i + 1 ? 1.0 : 0.0); });
+    const auto ones = Generate<double>(n, n, [](int32_t i, int32_t j) { return j <= i ? 1.0 : 0.0; });
+    const auto inverse =
+        Generate<double>(n, n, [](int32_t i, int32_t j) { return i == j ? 1.0 : (i == j + 1 ? -1.0 : 0.0); });
+    return Product(ones, Product(block, inverse));
+}
+
+inline DenseMatrix<Complex> ToComplex(const DenseMatrix<double>& a) {
+    return Generate<Complex>(a.rows, a.columns, [&a](int32_t i, int32_t j) { return Complex{a(i, j), 0.0}; });
+}
+inline DenseMatrix<Complex> ToComplex(const DenseMatrix<Complex>& a) {
+    return a;
 }
 
 }  // namespace krnumer
