@@ -8,6 +8,7 @@
 #include <krnumer/fft.h>
 #include <krnumer/filter.h>
 #include <krnumer/gen.h>
+#include <krnumer/integration.h>
 #include <krnumer/linalg.h>
 #include <krnumer/measure.h>
 #include <krnumer/noise.h>
@@ -18,6 +19,7 @@
 #include <krnumer/status.h>
 #include <krnumer/transform.h>
 #include <krnumer/types.h>
+#include <krnumer/vector.h>
 #include <krnumer/window.h>
 #include <krnumer/zoom.h>
 
