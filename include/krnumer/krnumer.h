@@ -4,6 +4,7 @@
 
 #include <krnumer/anova.h>
 #include <krnumer/binding.h>
+#include <krnumer/coord.h>
 #include <krnumer/distributions.h>
 #include <krnumer/fft.h>
 #include <krnumer/filter.h>
