@@ -4,6 +4,7 @@
 #   cmake -DBUILD=... -DLIBDIR=lib [-DFLAGS=...] -P run.cmake
 
 set(user ${CMAKE_CURRENT_LIST_DIR}/user)
+set(program ${CMAKE_CURRENT_LIST_DIR}/../../examples/first.c)
 set(work ${BUILD}/tests/package/work)
 set(prefix ${work}/prefix)
 file(REMOVE_RECURSE ${work})
@@ -16,7 +17,7 @@ endfunction()
 run(${CMAKE_COMMAND} --install ${BUILD} --prefix ${prefix})
 
 run(${CMAKE_COMMAND} -S ${user} -B ${work}/cmake -G Ninja -DCMAKE_PREFIX_PATH=${prefix}
-    -DCMAKE_C_FLAGS=${FLAGS} -DCMAKE_CXX_FLAGS=${FLAGS})
+    -DC_PROGRAM=${program} -DCMAKE_C_FLAGS=${FLAGS} -DCMAKE_CXX_FLAGS=${FLAGS})
 run(${CMAKE_COMMAND} --build ${work}/cmake)
 run(${work}/cmake/c_user)
 run(${work}/cmake/cpp_user)
@@ -27,7 +28,7 @@ set(ENV{LD_LIBRARY_PATH} ${prefix}/${LIBDIR})
 execute_process(COMMAND ${PKG_CONFIG} --cflags --libs krnumer krrt OUTPUT_VARIABLE options
     OUTPUT_STRIP_TRAILING_WHITESPACE COMMAND_ERROR_IS_FATAL ANY)
 separate_arguments(options UNIX_COMMAND "${FLAGS} ${options}")
-run(cc ${user}/user.c -o ${work}/pkgconfig_c_user ${options})
+run(cc ${program} -o ${work}/pkgconfig_c_user ${options})
 run(c++ ${user}/user.cpp -o ${work}/pkgconfig_cpp_user ${options})
 run(${work}/pkgconfig_c_user)
 run(${work}/pkgconfig_cpp_user)

@@ -1,11 +1,13 @@
-// The same from C++: the headers have to be C++ as well.
+// The headers and the libraries from C++: the mean of what the host's array holds.
 #include <krnumer/krnumer.h>
 #include <krrt/krrt.h>
 
 int main() {
-    KrHandle samples = KrrtNewArray(KRRT_COMPLEX, 3);
-    auto* first = static_cast<KrComplex*>(KrrtElements(samples));
-    const bool zeroed = first->re == 0.0 && first->im == 0.0;
+    KrHandle samples = KrrtNewArray(KRRT_DOUBLE, 2);
+    static_cast<double*>(KrrtElements(samples))[1] = 5.0;
+    double mean = 0.0;
+    int32_t err = KRN_EMPTY_INPUT;
+    Mean_head(samples, &mean, &err);
     KrrtFree(samples);
-    return zeroed && SetKRRTModule(nullptr) == nullptr ? 0 : 1;
+    return err == KRN_OK && mean == 2.5 ? 0 : 1;
 }
