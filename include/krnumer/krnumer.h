@@ -10,6 +10,7 @@
 #include <krnumer/filter.h>
 #include <krnumer/gen.h>
 #include <krnumer/integration.h>
+#include <krnumer/interpolation.h>
 #include <krnumer/linalg.h>
 #include <krnumer/measure.h>
 #include <krnumer/noise.h>
