@@ -54,7 +54,7 @@ TYPED_TEST(SimpleMatrices, TraceSumsTheDiagonalOfAnyShape) {
         const Matrix<T> a = IntegerMatrix<T>(m, n, 4);
         T sum{};
         for (int32_t i = 0; i < std::min(m, n); ++i) sum += a(i, i);
-        EXPECT_EQ(this->Trace(a.ToHost().handle(), &this->scalar_, &this->err_), 0);
+        EXPECT_EQ(this->Trace(ToHost(a).handle(), &this->scalar_, &this->err_), 0);
         EXPECT_EQ(this->err_, kOk);
         EXPECT_EQ(Value(this->scalar_), sum) << m << " by " << n;
     }
@@ -75,8 +75,8 @@ TYPED_TEST(SimpleMatrices, TransposeMirrorsEveryShape) {
     using T = TypeParam;
     for (const auto& [m, n] : {std::pair(1, 1), {1, 7}, {9, 1}, {8, 8}, {17, 23}, {3, 40}}) {
         const Matrix<T> a = IntegerMatrix<T>(m, n, 6);
-        ASSERT_EQ(this->Transpose(a.ToHost()), kOk);
-        EXPECT_EQ(Matrix<T>(this->out_), Adjoint(a)) << m << " by " << n;
+        ASSERT_EQ(this->Transpose(ToHost(a)), kOk);
+        EXPECT_EQ(FromHost(this->out_), Adjoint(a)) << m << " by " << n;
 
         Matrix<T> plain(n, m), in_place = a, conjugated = a;
         ASSERT_EQ(TransposeCore(a.elements.data(), m, n, plain.elements.data()), kOk);
@@ -102,13 +102,13 @@ TYPED_TEST(SimpleMatrices, SpecialFormsAreThoseOfTheReference) {
     using T = TypeParam;
     const auto& golden = Golden<T>();
     EXPECT_EQ(this->Make(kIdentity, 3, {}, {}), kOk);
-    EXPECT_EQ(Matrix<T>(this->out_), Identity<T>(3));
+    EXPECT_EQ(FromHost(this->out_), Identity<T>(3));
     EXPECT_EQ(this->Make(kDiagonal, 9, golden.x, golden.y), kOk);
-    EXPECT_EQ(Matrix<T>(this->out_), golden.diagonal);
+    EXPECT_EQ(FromHost(this->out_), golden.diagonal);
     EXPECT_EQ(this->Make(kToeplitz, -4, golden.x, golden.y), kOk);
-    EXPECT_EQ(Matrix<T>(this->out_), golden.toeplitz);
+    EXPECT_EQ(FromHost(this->out_), golden.toeplitz);
     EXPECT_EQ(this->Make(kVandermonde, 0, golden.x, {}), kOk);
-    EXPECT_EQ(Matrix<T>(this->out_), golden.vandermonde);
+    EXPECT_EQ(FromHost(this->out_), golden.vandermonde);
     EXPECT_EQ(this->Make(kCompanion, 0, golden.y, {}), kOk);
     EXPECT_EQ(this->out_.rows(), golden.companion.rows);
     EXPECT_THAT(this->out_.values(), AllNear(golden.companion.elements, 1e-15));
@@ -118,7 +118,7 @@ TYPED_TEST(SimpleMatrices, ToeplitzNeverReadsTheFirstOfTheRow) {
     using T = TypeParam;
     const T one = FromReal<T>(1), two = FromReal<T>(2), nan = FromReal<T>(kQuietNaN);
     EXPECT_EQ(this->Make(kToeplitz, 0, {one}, {nan, two}), kOk);
-    EXPECT_EQ(Matrix<T>(this->out_), Matrix<T>(1, 2, {one, two}));
+    EXPECT_EQ(FromHost(this->out_), Matrix<T>(1, 2, {one, two}));
 }
 
 TYPED_TEST(SimpleMatrices, SpecialFormsCheckSizesBeforeTheKind) {

@@ -87,12 +87,12 @@ TYPED_TEST(PackedTriangles, UnpackColumnByColumn) {
     const std::vector<T> e = this->SixElements();
     const T zero{};
     EXPECT_EQ(this->Unpack(e, kLower), kOk);
-    EXPECT_EQ(Matrix<T>(this->matrix_), Matrix<T>(3, 3, {e[0], zero, zero, e[1], e[3], zero, e[2], e[4], e[5]}));
+    EXPECT_EQ(FromHost(this->matrix_), Matrix<T>(3, 3, {e[0], zero, zero, e[1], e[3], zero, e[2], e[4], e[5]}));
     EXPECT_EQ(this->Unpack(e, kUpper), kOk);
-    EXPECT_EQ(Matrix<T>(this->matrix_), Matrix<T>(3, 3, {e[0], e[1], e[3], zero, e[2], e[4], zero, zero, e[5]}));
+    EXPECT_EQ(FromHost(this->matrix_), Matrix<T>(3, 3, {e[0], e[1], e[3], zero, e[2], e[4], zero, zero, e[5]}));
     // The diagonal stays as it is, imaginary parts included.
     EXPECT_EQ(this->Unpack(e, kSymmetric), kOk);
-    EXPECT_EQ(Matrix<T>(this->matrix_),
+    EXPECT_EQ(FromHost(this->matrix_),
               Matrix<T>(3, 3, {e[0], Conjugate(e[1]), Conjugate(e[2]), e[1], e[3], Conjugate(e[4]), e[2], e[4], e[5]}));
 }
 

@@ -35,12 +35,12 @@ TYPED_TEST_SUITE(Products, ElementTypes);
 TYPED_TEST(Products, MultiplyAsTheReferenceDoes) {
     using T = TypeParam;
     const auto& golden = Golden<T>();
-    const HostMatrix<T> a = golden.a.ToHost(), b = golden.b.ToHost();
+    const HostMatrix<T> a = ToHost(golden.a), b = ToHost(golden.b);
     EXPECT_EQ(this->MatMul(a.handle(), b.handle(), this->out_.handle(), &this->err_), 0);
     EXPECT_EQ(this->err_, kOk);
-    EXPECT_EQ(Matrix<T>(this->out_), golden.a_times_b);
+    EXPECT_EQ(FromHost(this->out_), golden.a_times_b);
     EXPECT_EQ(this->Kronecker(a.handle(), b.handle(), this->out_.handle()), kOk);
-    EXPECT_EQ(Matrix<T>(this->out_), golden.a_kronecker_b);
+    EXPECT_EQ(FromHost(this->out_), golden.a_kronecker_b);
 
     const HostArray<T> x(golden.x), y(golden.y);
     EXPECT_EQ(this->MatVec(a.handle(), x.handle(), this->vector_out_.handle(), &this->err_), 0);
@@ -48,7 +48,7 @@ TYPED_TEST(Products, MultiplyAsTheReferenceDoes) {
     EXPECT_EQ(this->VecMat(y.handle(), a.handle(), this->vector_out_.handle()), kOk);
     EXPECT_EQ(this->vector_out_.values(), golden.y_times_a);
     EXPECT_EQ(this->Outer(x.handle(), y.handle(), this->out_.handle(), &this->err_), 0);
-    EXPECT_EQ(Matrix<T>(this->out_), golden.x_outer_y);
+    EXPECT_EQ(FromHost(this->out_), golden.x_outer_y);
     EXPECT_EQ(this->Dot(x.handle(), x.handle(), &this->scalar_, &this->err_), 0);
     EXPECT_EQ(Value(this->scalar_), golden.x_dot_x);
 }
@@ -62,10 +62,10 @@ TYPED_TEST(Products, AreExactOnIntegersOfAllSizes) {
                                 x = IntegerMatrix<T>(k, 1, 3);
                 Matrix<T> c(m, n);
                 ASSERT_EQ(MatMulCore(a.elements.data(), b.elements.data(), m, k, n, c.elements.data()), kOk);
-                ASSERT_EQ(c, a * b) << m << ' ' << k << ' ' << n;
+                ASSERT_EQ(c, Product(a, b)) << m << ' ' << k << ' ' << n;
                 Matrix<T> y(m, 1);
                 ASSERT_EQ(MatVecCore(a.elements.data(), m, k, x.elements.data(), y.elements.data()), kOk);
-                ASSERT_EQ(y, a * x) << m << ' ' << k;
+                ASSERT_EQ(y, Product(a, x)) << m << ' ' << k;
             }
         }
     }
@@ -93,9 +93,9 @@ TYPED_TEST(Products, AddInIndexOrder) {
 TYPED_TEST(Products, TakeArraysThatAreInputAndOutput) {
     using T = TypeParam;
     const Matrix<T> a = IntegerMatrix<T>(3, 3, 5);
-    HostMatrix<T> both = a.ToHost();
+    HostMatrix<T> both = ToHost(a);
     EXPECT_EQ(this->MatMul(both.handle(), both.handle(), both.handle(), &this->err_), 0);
-    EXPECT_EQ(Matrix<T>(both), a * a);
+    EXPECT_EQ(FromHost(both), Product(a, a));
 }
 
 // --- Sizes of 0 and below -------------------------------------------------------------------------------------------

@@ -6,6 +6,7 @@
 #include <cmath>
 #include <cstdint>
 #include <random>
+#include <utility>
 #include <vector>
 
 #include "frame/complex.h"
@@ -17,11 +18,15 @@ namespace krnumer {
 template <class T>
 struct DenseMatrix {
     DenseMatrix(int32_t m, int32_t n) : rows(m), columns(n), elements(Count(m) * Count(n), T{}) {}
+    DenseMatrix(int32_t m, int32_t n, std::vector<T> row_after_row)
+        : rows(m), columns(n), elements(std::move(row_after_row)) {}
 
     T& operator()(int32_t i, int32_t j) { return elements[Count(i) * Count(columns) + Count(j)]; }
     T operator()(int32_t i, int32_t j) const { return elements[Count(i) * Count(columns) + Count(j)]; }
     T* data() { return elements.data(); }
     const T* data() const { return elements.data(); }
+
+    friend bool operator==(const DenseMatrix&, const DenseMatrix&) = default;
 
     int32_t rows;
     int32_t columns;
