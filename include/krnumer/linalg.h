@@ -14,5 +14,6 @@
 
 #include <krnumer/linalg_basic.h>
 #include <krnumer/linalg_eigen.h>
+#include <krnumer/linalg_factor.h>
 
 #endif

@@ -2,12 +2,15 @@
 // a status. Each core is one template over the element; its complex form also goes by a name of its own.
 #pragma once
 
+#include "linalg/cholesky.h"
 #include "linalg/eigen_general.h"
 #include "linalg/eigen_polynomial.h"
 #include "linalg/eigen_symmetric.h"
 #include "linalg/finite.h"
+#include "linalg/lu.h"
 #include "linalg/packed.h"
 #include "linalg/products.h"
+#include "linalg/qr.h"
 #include "linalg/special_matrix.h"
 #include "linalg/svd.h"
 #include "linalg/transpose.h"
@@ -24,5 +27,10 @@ inline constexpr auto& CxUnpackTriangle = UnpackTriangle<Complex>;
 inline constexpr auto& CxMakeSpecialMatrix = MakeSpecialMatrix<Complex>;
 inline constexpr auto& CxSvdCore = SvdCore<Complex>;
 inline constexpr auto& CxSvdValuesCore = SvdValuesCore<Complex>;
+
+inline constexpr int32_t (&CxLUFactor)(Complex*, int32_t, int32_t*, int32_t*) = LUFactor;
+inline constexpr int32_t (&CxCholeskyPacked)(Complex*, int32_t) = CholeskyPacked;
+inline constexpr auto& CxQRHouseholder = QRHouseholder<Complex>;
+inline constexpr auto& CxQRPivoted = QRPivoted<Complex>;
 
 }  // namespace krnumer

@@ -34,7 +34,7 @@ TYPED_TEST_SUITE(Products, ElementTypes);
 
 TYPED_TEST(Products, MultiplyAsTheReferenceDoes) {
     using T = TypeParam;
-    const auto& golden = Golden<T>();
+    const auto& golden = GoldenBasic<T>::Values();
     const HostMatrix<T> a = ToHost(golden.a), b = ToHost(golden.b);
     EXPECT_EQ(this->MatMul(a.handle(), b.handle(), this->out_.handle(), &this->err_), 0);
     EXPECT_EQ(this->err_, kOk);

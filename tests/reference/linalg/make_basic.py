@@ -5,36 +5,23 @@ All numbers are small integers, so every result but the companion matrix is exac
 """
 
 import sys
-from pathlib import Path
 
 import numpy as np
 import scipy
 import scipy.linalg
 
+from tables import element, matrix, vector, write
+
 random = np.random.default_rng(11)
 
 
-def integers(*shape):
+def draw_integers(*shape):
     return random.integers(-9, 10, shape)
-
-
-def element(value, is_complex):
-    if is_complex:
-        return f"{{{float(np.real(value))!r}, {float(np.imag(value))!r}}}"
-    return repr(float(value))
-
-
-def vector(values, is_complex):
-    return "{" + ", ".join(element(value, is_complex) for value in values) + "}"
-
-
-def matrix(values, is_complex):
-    return f"{{{values.shape[0]}, {values.shape[1]}, {vector(values.ravel(), is_complex)}}}"
 
 
 def fields(is_complex):
     def draw(*shape):
-        return integers(*shape) + (1j * integers(*shape) if is_complex else 0)
+        return draw_integers(*shape) + (1j * draw_integers(*shape) if is_complex else 0)
 
     a, b, x, y = draw(3, 4), draw(4, 2), draw(4), draw(3)
     x[0] = y[0]  # the corner of a Toeplitz matrix, which SciPy takes from the column
@@ -56,38 +43,15 @@ def fields(is_complex):
     }
 
 
-def main():
-    lines = [
-        f"// Made by make_basic.py with NumPy {np.__version__} and SciPy {scipy.__version__}.",
-        "#pragma once",
-        "",
-        "#include <vector>",
-        "",
-        '#include "linalg/matrices.h"',
-        "",
-        "namespace krnumer {",
-        "",
-        "template <class T>",
-        "struct GoldenBasic {",
-        "    Matrix<T> a, b;",
-        "    std::vector<T> x, y;",
-        "    Matrix<T> a_times_b, a_kronecker_b;",
-        "    std::vector<T> a_times_x, y_times_a;",
-        "    Matrix<T> x_outer_y;",
-        "    T x_dot_x;",
-        "    Matrix<T> diagonal, toeplitz, vandermonde, companion;",
-        "};",
-        "",
-        "template <class T>",
-        "const GoldenBasic<T>& Golden();",
-    ]
-    for name, is_complex in (("double", False), ("Complex", True)):
-        lines += ["", "template <>", f"inline const GoldenBasic<{name}>& Golden() {{", f"    static const GoldenBasic<{name}> kGolden{{"]
-        lines += [f"        .{field} = {value}," for field, value in fields(is_complex).items()]
-        lines += ["    };", "    return kGolden;", "}"]
-    lines += ["", "}  // namespace krnumer", ""]
-    Path(__file__).with_name("basic.inc").write_text("\n".join(lines))
-
+MEMBERS = """
+    Matrix<T> a, b;
+    std::vector<T> x, y;
+    Matrix<T> a_times_b, a_kronecker_b;
+    std::vector<T> a_times_x, y_times_a;
+    Matrix<T> x_outer_y;
+    T x_dot_x;
+    Matrix<T> diagonal, toeplitz, vandermonde, companion;
+"""
 
 if __name__ == "__main__":
-    sys.exit(main())
+    sys.exit(write("basic", MEMBERS, fields))
