@@ -156,4 +156,126 @@ KRNUMER_API int32_t Correlation_2DH(KrHandle x, KrHandle y, KrHandle z, int32_t 
 /** Correlation_2DH of complex planes; `x` is conjugated too. */
 KRNUMER_API int32_t CxCorrelation_2DH(KrHandle x, KrHandle y, KrHandle z, int32_t algorithm);
 
+/* ---- Samples in the time domain ----------------------------------------------------------------------------------
+ */
+
+/**
+ * Derivative by central differences, y[i] = (x[i+1] - x[i-1]) / (2 dt).
+ *
+ * @param[in,out] x        samples
+ * @param[in]     initial  the sample before the first
+ * @param[in]     final    the sample after the last
+ * @param[in]     dt       sampling interval
+ * @param[out]    err      status: 0; -20016 unless `dt` is above 0; -20003 when `x` is empty and `dt` is not to blame
+ * @return                 0
+ */
+KRNUMER_API int32_t Derivative(KrHandle x, const double* initial, const double* final, const double* dt, int32_t* err);
+
+/**
+ * Integral by a running sum of Simpson's rule, y[i] = y[i-1] + (x[i-1] + 4 x[i] + x[i+1]) dt / 6.
+ *
+ * @param[in,out] x        samples
+ * @param[in]     initial  the sample before the first
+ * @param[in]     final    the sample after the last
+ * @param[in]     dt       sampling interval; NaN gives NaN
+ * @param[out]    err      status: 0; -20003 when `x` is empty; -20016 when `dt` is 0 or less
+ * @return                 0
+ */
+KRNUMER_API int32_t Integral(KrHandle x, const double* initial, const double* final, const double* dt, int32_t* err);
+
+/**
+ * Unwraps a phase: whole turns are taken off so that no sample lies more than pi from the one before it, as that was
+ * corrected. A step of exactly pi is taken down, one of -pi stays.
+ *
+ * @param[in,out] x    phase in radians
+ * @param[out]    err  status: 0, or -20003 when `x` is empty
+ * @return             0
+ */
+KRNUMER_API int32_t unWrap(KrHandle x, int32_t* err);
+
+/**
+ * Finds where channels cross their trigger levels.
+ *
+ * A rising trigger is armed by a sample below level - |hysteresis| and hit by the next sample at or above the level; a
+ * falling one by a sample above level + |hysteresis| and hit by the next at or below the level. A hit disarms it.
+ *
+ * @param[in]  x           channels by samples
+ * @param[in]  levels      1-D double, an element per channel, as the next three
+ * @param[in]  previous    the sample before the first
+ * @param[in]  hysteresis  distance from the level; its sign does not matter
+ * @param[in]  slopes      1-D int32: 1 rising, 0 falling; any other value never hits
+ * @param[in]  maxPerRow   hits looked for in a channel; below 1, none
+ * @param[out] found       1-D int32, channels times maxPerRow: the indices of the hits of all channels, one after the
+ *                         other, with a 0 for a channel without a hit. The first 50 are stored; elements behind the
+ *                         last stay as the host delivers them.
+ * @param[out] counts      1-D int32: hits of each channel, those beyond the 50 too
+ * @param[out] flags       1-D int32: 1 for a channel with a hit, else 0
+ * @param[out] last        1-D double: the last sample of each channel, to be `previous` of the next block; without
+ *                         samples, `previous` itself
+ * @param[out] err         status: 0; -20002 when an array has fewer elements than there are channels; -20001 without
+ *                         memory
+ * @return                 0
+ */
+KRNUMER_API int32_t Triggerh(KrHandle x, KrHandle levels, KrHandle previous, KrHandle hysteresis, KrHandle slopes,
+                             int32_t maxPerRow, KrHandle found, KrHandle counts, KrHandle flags, KrHandle last,
+                             int32_t* err);
+
+/**
+ * Measures of a single pulse, after the histogram method of IEEE Std 181.
+ *
+ * Base and top are the centers of the fullest bins in the lower and the upper half of a histogram of 101 bins.
+ * Crossings of 10, 50 and 90 % of the amplitude are interpolated linearly; times count samples. A waveform whose first
+ * sample lies above the middle is a negative pulse: base lies above top then, the amplitude is negative, and the times
+ * are those of the mirror image. A pulse that ends before a level is met is measured to its end.
+ *
+ * @param[in]  x           samples
+ * @param[out] top         level of the pulse
+ * @param[out] base        level outside the pulse
+ * @param[out] amplitude   top - base
+ * @param[out] delay       time of the first crossing of the middle
+ * @param[out] width       time from there to the crossing back
+ * @param[out] slewRate    0.8 amplitude / riseTime; 1e+30 for a riseTime of 0
+ * @param[out] fallTime    time from 90 % to 10 %
+ * @param[out] riseTime    time from 10 % to 90 %
+ * @param[out] overshoot   largest sample - upper level
+ * @param[out] undershoot  lower level - smallest sample
+ * @param[out] err         status: 0; -20003 when `x` is empty; -20001 without memory. Any other than 0 makes all
+ *                         measures 0
+ * @return                 0
+ */
+KRNUMER_API int32_t PulseParameters(KrHandle x, double* top, double* base, double* amplitude, double* delay,
+                                    double* width, double* slewRate, double* fallTime, double* riseTime,
+                                    double* overshoot, double* undershoot, int32_t* err);
+
+/**
+ * Frequency modulation of a sine: the phase advances by 2 pi (f + x) with every sample x of the message, then moves by
+ * its period 2 pi / c, down if it has reached it and up otherwise, and sin(c phase) replaces the sample.
+ *
+ * @param[in]     n         samples
+ * @param[in]     c         factor from phase to angle
+ * @param[out]    angleOut  the last angle, c phase, in degrees
+ * @param[in]     f         frequency of the carrier in cycles per sample
+ * @param[in,out] data      n samples of the message, then of the modulated carrier
+ * @param[in,out] peak      the largest sample so far: replaced by one whose integer part is larger in magnitude, within
+ *                          32 bits
+ * @param[in,out] phase     phase in radians, carried from call to call
+ * @return                  0
+ */
+KRNUMER_API int32_t FreqMod(int32_t n, double c, double* angleOut, double f, double* data, double* peak, double* phase);
+
+/**
+ * Phase modulation of a sine: the phase advances by 2 pi f and is moved as in FreqMod, and a sample x of the message,
+ * in degrees, becomes sin(c phase + x pi / 180).
+ *
+ * @param[in]     n         samples
+ * @param[in]     c         factor from phase to angle
+ * @param[out]    angleOut  the last angle, c phase, in degrees, plus the last sample of the output
+ * @param[in]     f         frequency of the carrier in cycles per sample
+ * @param[in,out] data      n samples of the message, then of the modulated carrier
+ * @param[in,out] peak      the largest sample so far, as in FreqMod
+ * @param[in,out] phase     phase in radians, carried from call to call
+ * @return                  0
+ */
+KRNUMER_API int32_t PhasMod(int32_t n, double c, double* angleOut, double f, double* data, double* peak, double* phase);
+
 #endif

@@ -87,11 +87,8 @@ TYPED_TEST(PlaneTest, AgreesWithGoldenData) {
     using T = TypeParam;
     const Golden golden("convolution2d");
     const std::string kind = std::is_same_v<T, Complex> ? "complex" : "float";
-    int compared = 0;
-    for (const std::string& name : golden.Cases()) {
-        if (!name.starts_with(kind)) continue;
+    for (const std::string& name : golden.Cases(kind)) {
         SCOPED_TRACE(name);
-        ++compared;
         const auto sizes = golden.Integers(name + ".sizes");
         const Matrix<T> x{sizes[0], sizes[1], golden.Get<T>(name + ".x")};
         const Matrix<T> y{sizes[2], sizes[3], golden.Get<T>(name + ".y")};
@@ -105,7 +102,6 @@ TYPED_TEST(PlaneTest, AgreesWithGoldenData) {
             EXPECT_THAT(Convolution(x, y, kValidOutput, algorithm), near(".valid"));
         }
     }
-    EXPECT_EQ(compared, 7);
 }
 
 TYPED_TEST(PlaneTest, DirectSumsRunAlongRowsAndColumnsOfTheSmallerPlane) {

@@ -79,11 +79,8 @@ TYPED_TEST(ConvolutionTest, AgreesWithGoldenData) {
     using T = TypeParam;
     const Golden golden("convolution");
     const std::string kind = std::is_same_v<T, Complex> ? "complex" : "float";
-    int compared = 0;
-    for (const std::string& name : golden.Cases()) {
-        if (!name.starts_with(kind)) continue;
+    for (const std::string& name : golden.Cases(kind)) {
         SCOPED_TRACE(name);
-        ++compared;
         const auto x = golden.Get<T>(name + ".x");
         const auto y = golden.Get<T>(name + ".y");
         const auto near = [&](const char* what) { return AllNear(golden.Get<T>(name + what), 0.0, 1e-13); };
@@ -94,7 +91,6 @@ TYPED_TEST(ConvolutionTest, AgreesWithGoldenData) {
             EXPECT_THAT(Correlation(x, y, algorithm, kBiased), near(".biased"));
         }
     }
-    EXPECT_EQ(compared, 7);
 }
 
 TYPED_TEST(ConvolutionTest, BothAlgorithmsGiveTheExactSums) {

@@ -31,12 +31,13 @@ std::vector<int32_t> Golden::Integers(const std::string& name) const {
     return {numbers.begin(), numbers.end()};
 }
 
-std::vector<std::string> Golden::Cases() const {
+std::vector<std::string> Golden::Cases(const std::string& prefix) const {
     std::vector<std::string> cases;
     for (const auto& [name, numbers] : signals_) {
         const std::string stem = name.substr(0, name.find('.'));
-        if (cases.empty() || cases.back() != stem) cases.push_back(stem);
+        if (stem.starts_with(prefix) && (cases.empty() || cases.back() != stem)) cases.push_back(stem);
     }
+    if (cases.empty()) throw std::out_of_range("no reference for " + prefix);
     return cases;
 }
 

@@ -58,8 +58,9 @@ class Golden {
     std::vector<int32_t> Integers(const std::string& name) const;
     double Number(const std::string& name) const { return Reals(name).at(0); }
 
-    // Names up to their first dot, each once.
-    std::vector<std::string> Cases() const;
+    // Names up to their first dot, each once: all, or those that begin with the prefix. Throws std::out_of_range when
+    // there is none.
+    std::vector<std::string> Cases(const std::string& prefix = "") const;
 
     template <class T>
     std::vector<T> Get(const std::string& name) const {

@@ -127,3 +127,43 @@ SWEEP(CxCorrelation_2DH) {
     const KrHandle z = scene.OutComplexMatrix();
     return scene.Call([&] { return CxCorrelation_2DH(x, y, z, kDirect); });
 }
+
+SWEEP(Derivative) {
+    const KrHandle x = scene.Replaced(scene.Doubles(kReal));
+    const double initial = 1, final = 2, dt = 0.5;
+    return scene.Call([&] { return Derivative(x, &initial, &final, &dt, scene.err()); });
+}
+SWEEP(Integral) {
+    const KrHandle x = scene.Replaced(scene.Doubles(kReal));
+    const double initial = 1, final = 2, dt = 0.5;
+    return scene.Call([&] { return Integral(x, &initial, &final, &dt, scene.err()); });
+}
+SWEEP(unWrap) {
+    const KrHandle x = scene.Replaced(scene.Doubles({0, 4, 8, 1}));
+    return scene.Call([&] { return unWrap(x, scene.err()); });
+}
+SWEEP(Triggerh) {
+    const KrHandle x = scene.Matrix(2, 4, {0, 2, 0, 2, 3, 0, 3, 0});
+    const KrHandle levels = scene.Doubles({1, 1}), previous = scene.Doubles({0, 0});
+    const KrHandle hysteresis = scene.Doubles({0.5, 0.5}), slopes = scene.Integers({1, 0});
+    const KrHandle found = scene.OutIntegers(), counts = scene.OutIntegers(), flags = scene.OutIntegers();
+    const KrHandle last = scene.OutDoubles();
+    return scene.Call(
+        [&] { return Triggerh(x, levels, previous, hysteresis, slopes, 2, found, counts, flags, last, scene.err()); });
+}
+// Begins above the middle, so that it is mirrored; a failure makes the measures 0.
+SWEEP(PulseParameters) {
+    const KrHandle x = scene.Doubles({5, 5, 5, 1, 0, 0, 2, 5, 5});
+    double* m = scene.Numbers(10, sweep::OnFailure::kOther);
+    return scene.Call([&] {
+        return PulseParameters(x, m, m + 1, m + 2, m + 3, m + 4, m + 5, m + 6, m + 7, m + 8, m + 9, scene.err());
+    });
+}
+SWEEP(FreqMod) {
+    double* state = scene.Numbers(6, sweep::OnFailure::kOther);
+    return scene.Call([&] { return FreqMod(3, 1.0, state, 0.1, state + 1, state + 4, state + 5); });
+}
+SWEEP(PhasMod) {
+    double* state = scene.Numbers(6, sweep::OnFailure::kOther);
+    return scene.Call([&] { return PhasMod(3, 1.0, state, 0.1, state + 1, state + 4, state + 5); });
+}
