@@ -14,6 +14,7 @@
 #include <krnumer/linalg.h>
 #include <krnumer/measure.h>
 #include <krnumer/noise.h>
+#include <krnumer/peak.h>
 #include <krnumer/sigop.h>
 #include <krnumer/special.h>
 #include <krnumer/spectrum.h>
