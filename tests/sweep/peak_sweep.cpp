@@ -6,7 +6,7 @@
 
 namespace {
 
-// One call with a detector, whose earlier block is taken undisturbed if there is one.
+// One call with a detector. A block before it, if there is one, has no peaks, so that it sizes nothing.
 int32_t Detect(sweep::Scene& scene, int32_t flags) {
     std::vector<double> samples;
     for (int i = 0; i < 40; ++i) samples.push_back(std::sin(0.5 * i));
@@ -20,11 +20,12 @@ int32_t Detect(sweep::Scene& scene, int32_t flags) {
     KrPeakState state;
     KrHandle work = nullptr;
     if ((flags & KRN_FIRST_BLOCK) == 0) {
-        sweep::Scene undisturbed;
+        sweep::Scene before;
         KrPeakRecord former = record;
-        former.locations = undisturbed.OutDoubles();
-        former.amplitudes = undisturbed.OutDoubles();
-        former.second_derivatives = undisturbed.OutDoubles();
+        former.input = before.Doubles({0, 0, 0, 0, 0, 0});
+        former.locations = before.OutDoubles();
+        former.amplitudes = before.OutDoubles();
+        former.second_derivatives = before.OutDoubles();
         former.flags = KRN_FIRST_BLOCK;
         int32_t err;
         PeakD(&former, &state, &work, &err);
@@ -43,6 +44,10 @@ SWEEP(PeakD) {
 
 SWEEP_MORE(PeakD, first) {
     return Detect(scene, KRN_FIRST_BLOCK);
+}
+
+SWEEP_MORE(PeakD, last) {
+    return Detect(scene, KRN_LAST_BLOCK);
 }
 
 SWEEP(PeakDetector) {
