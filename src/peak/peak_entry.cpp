@@ -57,10 +57,11 @@ class WorkBlock {
         *handle_ = nullptr;
     }
 
-    // The first aligned place behind the count.
+    // At the first aligned place behind the count.
     double* weights() const {
-        const auto address = reinterpret_cast<uintptr_t>(**handle_) + sizeof(int32_t);
-        return reinterpret_cast<double*>((address + alignof(double) - 1) / alignof(double) * alignof(double));
+        char* const begin = *reinterpret_cast<char**>(*handle_) + sizeof(int32_t);
+        const size_t over = reinterpret_cast<uintptr_t>(begin) % alignof(double);
+        return reinterpret_cast<double*>(begin + (over == 0 ? 0 : alignof(double) - over));
     }
 
   private:
