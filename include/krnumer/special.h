@@ -367,4 +367,152 @@ KRNUMER_API void KR_ParabolicCylinder(double x, double v, double* out);
  */
 KRNUMER_API void KR_Zeta(double x, double* out);
 
+/**
+ * Bessel function of the first kind of real order, J_v(x).
+ *
+ * Integer orders by recurrence from J_0 and J_1 in the stable direction: absolute error 2e-15 for x up to v, 1e-14 up
+ * to x = 1e4; the time grows with v. Other orders by the power series, Hankel's asymptotic series, recurrence between
+ * them, and from 200 on uniform expansions with Airy functions: absolute error 5e-12 up to 300, 2e-12 above.
+ *
+ * J_-n = J_n(-x) = (-1)^n J_n for integers. 0 for |x| below 2^-52 where v is no integer, whatever the sign of v. NaN
+ * for v below -200 and for negative x where v is no integer, for infinite arguments, and where Airy functions overflow:
+ * v above 200, x far below v but above 3.6 sqrt(v), such as J_1000.3(300).
+ *
+ * @param[in]  v    order
+ * @param[in]  x    argument
+ * @param[out] out  J_v(x)
+ */
+KRNUMER_API void KR_BesselJr(double v, double x, double* out);
+
+/**
+ * Bessel function of the second kind of real order, Y_v(x), for x > 0.
+ *
+ * Integer orders by upward recurrence from Y_0 and Y_1, relative error 1e-14 for x up to v and absolute error 1e-14
+ * above; the time grows with v. -infinity, or +infinity for odd negative v, where the value is beyond the largest
+ * double. Other orders from J_v and J_-v: absolute error 1e-12, growing as 1 / |v - n| near an integer n.
+ *
+ * NaN for x <= 0, infinite arguments, v beyond 32 bits, and other than integers outside -200 to 200.
+ *
+ * @param[in]  v    order
+ * @param[in]  x    x > 0
+ * @param[out] out  Y_v(x)
+ */
+KRNUMER_API void KR_BesselYr(double v, double x, double* out);
+
+/**
+ * Spherical Bessel function of the first kind, j_n(x) = sqrt(pi / (2x)) J_(n + 1/2)(x), for x >= 0.
+ *
+ * Absolute error 1e-12 for n up to 10, 1e-14 above. At x = 0, 1 for n = 0 and 0 otherwise;
+ * below 2^-52 it is 0 for n = 0 too. 0 at +infinity. NaN for negative x and for n below -200.
+ *
+ * @param[in]  n    order
+ * @param[in]  x    x >= 0
+ * @param[out] out  j_n(x)
+ */
+KRNUMER_API void KR_BesselJs(int32_t n, double x, double* out);
+
+/**
+ * Spherical Bessel function of the second kind, y_n(x) = sqrt(pi / (2x)) Y_(n + 1/2)(x), for x >= 0.
+ *
+ * Absolute error 1e-12 for n up to 10, 2e-13 above. -infinity at x = 0, 0 at +infinity. NaN for negative x and for n outside -200 to 199.
+ *
+ * @param[in]  n    order
+ * @param[in]  x    x >= 0
+ * @param[out] out  y_n(x)
+ */
+KRNUMER_API void KR_BesselYs(int32_t n, double x, double* out);
+
+/**
+ * Modified Bessel function of the first kind of real order, I_v(x).
+ *
+ * Chebyshev series for v = 0 and 1, relative error 1e-15. Other integers by Miller's downward recurrence from 2 (|v| +
+ * sqrt(100 |v|)), wherever x is: relative error 1e-13 for x up to 30, but I_2 is 6e-13 off at x = 40, 8e-7 at 100 and
+ * 1e-4 at 200, I_3 7e-2 at 500. Other orders from Kummer's function M(v + 1/2, 2v + 1, 2x), from the power series for
+ * v = -1/2, -3/2, ...: relative error 2e-13 for v up to 30 and x up to 300.
+ *
+ * At x = 0, 1 for v = 0, 0 for other integers and positive v, otherwise an infinity with the sign of Gamma(v + 1).
+ * +infinity at x = +infinity, 0 for infinite v and x = 0. NaN for x = -infinity, v = -infinity, |v| above 2^31, and
+ * where v is no integer for v below -200 and negative x.
+ *
+ * @param[in]  v    order
+ * @param[in]  x    argument
+ * @param[out] out  I_v(x)
+ */
+KRNUMER_API void KR_BesselIr(double v, double x, double* out);
+
+/**
+ * Modified Bessel function of the second kind of integer order, K_n(x) = K_-n(x), for x > 0.
+ *
+ * Chebyshev series for n = 0 and 1, upward recurrence above: relative error 3e-15 for n up to 50, 1e-14 up to 1000.
+ * +infinity at x = 0 and where the value overflows, 0 at +infinity, NaN for negative x.
+ *
+ * @param[in]  n    order
+ * @param[in]  x    x > 0
+ * @param[out] out  K_n(x)
+ */
+KRNUMER_API void KR_BesselKn(int32_t n, double x, double* out);
+
+/**
+ * Kelvin functions of the first kind of integer order, ber_n(x) + i bei_n(x) = J_n(x e^(3 pi i / 4)).
+ *
+ * Power series (M. Abramowitz and I. A. Stegun, Handbook of Mathematical Functions, 1964, 9.9.9 and 9.9.10), whose
+ * terms cancel: relative error 1e-13 up to 10, 1e-8 at 60 and 4e-6 at 74; NaN from about 75 on, where the terms
+ * overflow. Values far below 1 have an absolute error of 1e-8. NaN for infinite x.
+ *
+ * @param[in]  x    argument
+ * @param[in]  n    order
+ * @param[out] ber  ber_n(x)
+ * @param[out] bei  bei_n(x)
+ */
+KRNUMER_API void KR_KelvinI(double x, int32_t n, double* ber, double* bei);
+
+/**
+ * Kelvin functions of the second kind of integer order, ker_n(x) + i kei_n(x) = e^(-n pi i / 2) K_n(x e^(pi i / 4)),
+ * for x > 0.
+ *
+ * Power series (9.9.11 and 9.9.12 of the same source), whose parts grow while the functions fall: relative error 1e-12
+ * up to 2, 3e-9 at 10, 2e-4 at 15, no digit from 25 on. An infinity for orders whose (x / 2)^n / n! underflows. NaN for
+ * x <= 0, from about 75 on and for infinite x.
+ *
+ * @param[in]  x    x > 0
+ * @param[in]  n    order
+ * @param[out] ker  ker_n(x)
+ * @param[out] kei  kei_n(x)
+ */
+KRNUMER_API void KR_KelvinK(double x, int32_t n, double* ker, double* kei);
+
+/**
+ * Airy functions Ai(x) and Bi(x) and their derivatives.
+ *
+ * Maclaurin's series between -2.09 and 2.09 (to 8.32 for Bi), rational approximations of the asymptotic forms
+ * elsewhere. Absolute error 5e-15 about 0 and 1e-13 down to -100 (derivatives 1e-12); relative error 1e-14 up to 8.3,
+ * 3e-13 up to 103. The phase loses digits below: absolute error 1e-10 at -1e5.
+ *
+ * For x above 103.892 and for infinite x, Ai is 0, Bi +infinity (0 at -infinity), and the derivatives are the largest
+ * double. NaN below about -1e205, where the phase is infinite.
+ *
+ * @param[in]  x        argument
+ * @param[out] ai       Ai(x)
+ * @param[out] bi       Bi(x)
+ * @param[out] aiPrime  Ai'(x); null where no derivative is wanted
+ * @param[out] biPrime  Bi'(x); not written where `aiPrime` is null
+ */
+KRNUMER_API void KR_Airy(double x, double* ai, double* bi, double* aiPrime, double* biPrime);
+
+/**
+ * Struve function, H_v(x). Note the order of the arguments.
+ *
+ * A power series below 18, from 18 on also an asymptotic series with Y_v, whichever estimates the smaller error; J_-v
+ * for v = -1/2, -3/2, .... Relative error 1e-10 for x up to 15 and from 31 on, 1e-9 between. For x from 18 on and v
+ * above x / 1.5 the asymptotic series misjudges itself, and digits are lost up to all of them.
+ *
+ * H_n(-x) = (-1)^(n + 1) H_n(x) for integers. 0 at x = 0 for v >= 0. NaN for negative x where v is no integer, for x =
+ * 0 with negative v, from v = 170.13 on, where gamma functions overflow, and for infinite arguments.
+ *
+ * @param[in]  x    argument
+ * @param[in]  v    order
+ * @param[out] out  H_v(x)
+ */
+KRNUMER_API void KR_Struve(double x, double v, double* out);
+
 #endif

@@ -6,7 +6,6 @@
 #include <fstream>
 #include <map>
 #include <sstream>
-#include <vector>
 
 #include "frame/numeric.h"
 #include "support/numbers.h"
@@ -45,7 +44,7 @@ std::vector<Line> ReadGolden(const std::string& name) {
 }  // namespace
 
 void ExpectGolden(const std::string& name, const std::function<double(const double*)>& function,
-                  std::initializer_list<Bound> bounds) {
+                  const std::vector<Bound>& bounds) {
     std::map<std::string, Bound> by_region;
     for (const Bound& bound : bounds) by_region[bound.region] = bound;
 

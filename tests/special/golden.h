@@ -2,8 +2,8 @@
 #pragma once
 
 #include <functional>
-#include <initializer_list>
 #include <string>
+#include <vector>
 
 namespace krnumer {
 
@@ -16,6 +16,6 @@ struct Bound {
 
 // Every line of the file by the bound of its region. Every region of the file has a bound and every bound a region.
 void ExpectGolden(const std::string& name, const std::function<double(const double*)>& function,
-                  std::initializer_list<Bound> bounds);
+                  const std::vector<Bound>& bounds);
 
 }  // namespace krnumer

@@ -104,3 +104,46 @@ SWEEP(KR_ParabolicCylinder) {
 SWEEP(KR_Zeta) {
     return Plain(scene, KR_Zeta, 3.5);
 }
+
+SWEEP(KR_BesselJr) {
+    return Plain(scene, KR_BesselJr, 2.25, 30.0);
+}
+SWEEP(KR_BesselYr) {
+    return Plain(scene, KR_BesselYr, 0.25, 3.0);
+}
+SWEEP(KR_BesselJs) {
+    return Plain(scene, KR_BesselJs, 3, 2.0);
+}
+SWEEP(KR_BesselYs) {
+    return Plain(scene, KR_BesselYs, 3, 2.0);
+}
+SWEEP(KR_BesselIr) {
+    return Plain(scene, KR_BesselIr, 2.7, 3.0);
+}
+SWEEP(KR_BesselKn) {
+    return Plain(scene, KR_BesselKn, 4, 2.0);
+}
+SWEEP(KR_KelvinI) {
+    double* const values = scene.Numbers(2);
+    return scene.Call([&] {
+        KR_KelvinI(2.0, 3, values, values + 1);
+        return 0;
+    });
+}
+SWEEP(KR_KelvinK) {
+    double* const values = scene.Numbers(2);
+    return scene.Call([&] {
+        KR_KelvinK(2.0, 3, values, values + 1);
+        return 0;
+    });
+}
+SWEEP(KR_Airy) {
+    double* const values = scene.Numbers(4);
+    return scene.Call([&] {
+        KR_Airy(5.0, values, values + 1, values + 2, values + 3);
+        return 0;
+    });
+}
+SWEEP(KR_Struve) {
+    return Plain(scene, KR_Struve, 25.0, 0.0);
+}

@@ -28,7 +28,7 @@ def main():
             continue
         with open(here / f"{function.name}.csv", "w", newline="") as file:
             writer = csv.writer(file, lineterminator="\n")
-            for region in function.regions:
+            for region in filter(lambda region: region.in_golden, function.regions):
                 for arguments in region.arguments(COUNT, function.name):
                     value = function.value(arguments)
                     if value is not None and abs(value) < 1.7e308:

@@ -21,6 +21,7 @@ class Region:
     name: str  # as the tests know it
     draw: Callable  # of a random.Random: one tuple of arguments, or one argument
     edges: list = field(default_factory=list)
+    in_golden: bool = True  # False where no digit is promised
 
     def arguments(self, count, key):
         rng = random.Random(f"{key}/{self.name}")
@@ -80,6 +81,6 @@ def every(*draws):
 
 
 def functions():
-    from . import elliptic, gamma, hypergeometric, integrals
+    from . import bessel, elliptic, gamma, hypergeometric, integrals
 
-    return [f for family in (gamma, integrals, elliptic, hypergeometric) for f in family.FUNCTIONS]
+    return [f for family in (gamma, bessel, integrals, elliptic, hypergeometric) for f in family.FUNCTIONS]

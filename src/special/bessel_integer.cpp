@@ -1,0 +1,121 @@
+// S. L. Moshier, Methods and Programs for Mathematical Functions, 1989, for the orders 0 and 1. Higher orders by the
+// three-term recurrence in the direction in which it is stable (W. Gautschi, Computational aspects of three-term
+// recurrence relations, 1967).
+#include "special/bessel_integer.h"
+
+#include <cmath>
+
+#include "frame/numeric.h"
+#include "special/bessel_coefficients.h"
+#include "special/continued_fraction.h"
+#include "special/gamma.h"
+#include "special/polynomial.h"
+
+namespace krnumer {
+namespace {
+
+constexpr double kQuarterPi = 0.7853981633974483;
+constexpr double kThreeQuarterPi = 2.356194490192345;
+constexpr double kTwoOverPi = 0.6366197723675814;
+constexpr double kSqrtTwoOverPi = 0.7978845608028654;
+constexpr double kLnSmallest = -745.2;  // of the smallest double
+
+// Both functions of one order for x > 5: P cos t - w Q sin t and P sin t + w Q cos t, times sqrt(2 / (pi x)).
+struct Modulus {
+    double p, wq, t, scale;
+    double J() const { return (p * std::cos(t) - wq * std::sin(t)) * scale; }
+    double Y() const { return (p * std::sin(t) + wq * std::cos(t)) * scale; }
+};
+
+Modulus ModulusOfOrder0(double x) {
+    const double w = 5.0 / x, q = 25.0 / (x * x);
+    return {PolyEval(q, kJ0PP) / PolyEval(q, kJ0PQ), w * (PolyEval(q, kJ0QP) / PolyEvalMonic(q, kJ0QQ)), x - kQuarterPi,
+            kSqrtTwoOverPi / std::sqrt(x)};
+}
+
+Modulus ModulusOfOrder1(double x) {
+    const double w = 5.0 / x, q = 25.0 / (x * x);
+    return {PolyEval(q, kJ1PP) / PolyEval(q, kJ1PQ), w * (PolyEval(q, kJ1QP) / PolyEvalMonic(q, kJ1QQ)),
+            x - kThreeQuarterPi, kSqrtTwoOverPi / std::sqrt(x)};
+}
+
+// Upward from the orders 0 and 1. Stable for J where x > n, and for Y.
+double Upward(double before, double value, double n, double x) {
+    for (double k = 1.0; k < n; k += 1.0) {
+        const double next = 2.0 * k * value / x - before;
+        before = value;
+        value = next;
+        if (std::isinf(value)) break;
+    }
+    return value;
+}
+
+// Downward from the ratio of J_n and J_(n - 1) to the known orders 0 and 1, for x <= n.
+double DownwardJ(double n, double x) {
+    constexpr double kLarge = 1e100;
+    double start = 1.0, above = 1.0, value = 1.0 / BesselRatio(n, x);
+    for (double k = n - 1.0; k > 0.0; k -= 1.0) {
+        const double next = (2.0 * k * value - x * above) / x;
+        above = value;
+        value = next;
+        if (std::abs(value) > kLarge) {
+            start /= kLarge;
+            above /= kLarge;
+            value /= kLarge;
+        }
+    }
+    return std::abs(above) > std::abs(value) ? BesselJ1(x) / above * start : BesselJ0(x) / value * start;
+}
+
+}  // namespace
+
+double BesselJ0(double x) {
+    if (x > 5.0) return ModulusOfOrder0(x).J();
+    const double z = x * x;
+    if (x < 1e-5) return 1.0 - z / 4.0;
+    return (z - kJ0Z1) * (z - kJ0Z2) * PolyEval(z, kJ0RP) / PolyEvalMonic(z, kJ0RQ);
+}
+
+double BesselY0(double x) {
+    if (x > 5.0) return ModulusOfOrder0(x).Y();
+    const double z = x * x;
+    return PolyEval(z, kY0YP) / PolyEvalMonic(z, kY0YQ) + kTwoOverPi * std::log(x) * BesselJ0(x);
+}
+
+double BesselJ1(double x) {
+    if (x > 5.0) return ModulusOfOrder1(x).J();
+    const double z = x * x;
+    return PolyEval(z, kJ1RP) / PolyEvalMonic(z, kJ1RQ) * x * (z - kJ1Z1) * (z - kJ1Z2);
+}
+
+double BesselY1(double x) {
+    if (x > 5.0) return ModulusOfOrder1(x).Y();
+    const double z = x * x;
+    return x * (PolyEval(z, kY1YP) / PolyEvalMonic(z, kY1YQ)) + kTwoOverPi * (BesselJ1(x) * std::log(x) - 1.0 / x);
+}
+
+double BesselRatio(double n, double x) {
+    ContinuedFraction fraction(0.0, 1.0, x, 2.0 * n, 1.0);
+    double b = 2.0 * n, change;
+    do {
+        b += 2.0;
+        fraction.Append(-(x * x), b);
+        change = fraction.Update();
+        fraction.KeepFromOverflow();
+    } while (change >= kEpsilon);
+    return fraction.value();
+}
+
+double BesselJn(double n, double x) {
+    if (n == 0.0) return BesselJ0(x);
+    if (n == 1.0) return BesselJ1(x);
+    if (x > n) return Upward(BesselJ0(x), BesselJ1(x), n, x);
+    if (n * std::log(x / 2.0) - LnGamma(n + 1.0) < kLnSmallest) return 0.0;  // (x / 2)^n / n! is a bound
+    return DownwardJ(n, x);
+}
+
+double BesselYn(double n, double x) {
+    return n == 0.0 ? BesselY0(x) : Upward(BesselY0(x), BesselY1(x), n, x);
+}
+
+}  // namespace krnumer

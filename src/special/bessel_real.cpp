@@ -1,0 +1,169 @@
+// S. L. Moshier, Methods and Programs for Mathematical Functions, 1989: the power series for small x, Hankel's
+// asymptotic series for large x, between them a recurrence to an order where either serves, and expansions that are
+// uniform in x from order 200 on.
+#include "special/bessel_real.h"
+
+#include <cmath>
+
+#include "special/bessel_integer.h"
+#include "special/bessel_uniform.h"
+#include "special/domain.h"
+#include "special/gamma.h"
+
+namespace krnumer {
+namespace {
+
+constexpr double kLeastOrder = -200.0;  // of orders that are no integers
+constexpr double kUniformFrom = 200.0;
+constexpr double kLargestInteger = 2147483647.0;
+
+bool IsOdd(double integer) {
+    return std::fmod(integer, 2.0) != 0.0;
+}
+
+// The power series in -x^2 / 4.
+double JvSeries(double v, double x) {
+    const double y = -(x * x) / 4.0;
+    double term = 1.0, sum = 1.0, k = 1.0, change = 1.0;
+    while (change >= kEpsilon) {
+        term *= y / ((k + v) * k);
+        sum += term;
+        k += 1.0;
+        if (sum != 0.0) change = std::abs(term / sum);
+    }
+    if (x >= 0.0 && v >= -1.0) return sum * std::exp(v * std::log(x / 2.0) - LnGamma(v + 1.0));
+    return sum * std::pow(0.5 * x, v) / Gamma(v + 1.0);
+}
+
+// Hankel's series in pairs of terms, up to the smallest.
+double JvHankel(double v, double x) {
+    const double m = 4.0 * v * v, z = 8.0 * x;
+    double j = 1.0, k = 1.0, sign = 1.0;
+    double term = (m - 1.0) / z, p = 1.0, q = term;
+    double best_p = 1.0, best_q = term, smallest = 1.0, change = 1.0;
+    bool fallen = false;
+    while (change > kEpsilon) {
+        k += 2.0;
+        j += 1.0;
+        sign = -sign;
+        term *= (m - k * k) / (j * z);
+        p += sign * term;
+        k += 2.0;
+        j += 1.0;
+        term *= (m - k * k) / (j * z);
+        q += sign * term;
+        change = std::abs(term / p);
+        if (change < smallest) {
+            smallest = change;
+            best_p = p;
+            best_q = q;
+            fallen = true;
+        }
+        if (fallen && change > smallest) break;
+    }
+    const double phase = x - (0.5 * v + 0.25) * kPi;
+    return std::sqrt(2.0 / (x * kPi)) * (best_p * std::cos(phase) - best_q * std::sin(phase));
+}
+
+struct Recurrence {
+    double from, to;  // orders, which may differ by 1 from what was asked for
+    double ratio;     // J_to / J_from
+};
+
+// From order n down to order k.
+Recurrence JvRecur(double n, double x, double k) {
+    double start = BesselRatio(n, x);
+    if (n < 0.0 && std::abs(start) < 0.125) {  // J_n is near one of its zeros
+        n -= 1.0;
+        start = BesselRatio(n, x);
+    }
+    double above = 1.0, value = 1.0 / start, order = n - 1.0;
+    do {
+        const double next = (2.0 * order * value - x * above) / x;
+        above = value;
+        value = next;
+        order -= 1.0;
+    } while (order > k + 0.5);
+    if (k >= 0.0 && std::abs(above) > std::abs(value)) return {n, order + 1.0, above};
+    return {n, order, value};
+}
+
+// J_k where the power series or Hankel's series is good, |k| below about 20 or not far above 3.6 sqrt(x).
+double ByEitherSeries(double k, double x) {
+    const double size = std::abs(k);
+    const double meeting = size >= 26.0 ? 0.9 * size : (0.0083 * size + 0.09) * size + 12.9;
+    return x <= meeting ? JvSeries(k, x) : JvHankel(k, x);
+}
+
+double ByRecurrence(double v, double x) {
+    double reach = 3.6 * std::sqrt(x);
+    if (reach <= 17.0) reach = 2.0;
+    if (std::abs(v) <= reach + 3.0) return ByEitherSeries(v, x);
+    const double fraction = v - std::floor(v);
+    if (v > 0.0) {
+        const Recurrence down = JvRecur(v, x, std::floor(reach) + fraction);
+        return down.ratio == 0.0 ? 0.0 : ByEitherSeries(down.to, x) / down.ratio;
+    }
+    const Recurrence down = JvRecur(std::floor(-reach) + fraction, x, v);
+    return down.ratio == 0.0 ? 0.0 : down.ratio * ByEitherSeries(down.from, x);
+}
+
+}  // namespace
+
+double BesselJ(double v, double x) {
+    if (!std::isfinite(x) || !std::isfinite(v)) return kQuietNaN;
+    const double size = std::abs(v);
+    const bool is_integer = v == std::floor(v);
+    if (v < kLeastOrder && !is_integer) return DomainError(kQuietNaN);
+    double sign = 1.0;
+    if (is_integer) {
+        if (IsOdd(size) && (v < 0.0) != (x < 0.0)) sign = -1.0;
+        v = size;
+        x = std::abs(x);
+        if (size <= kLargestInteger) return sign * BesselJn(v, x);
+    }
+    if (x < 0.0) return DomainError(kQuietNaN);
+    if (x < kEpsilon) return DomainError(0.0);
+    const double reach = 3.6 * std::sqrt(x);
+    if (size > 17.0) {
+        if (x < 3.6 * std::sqrt(size)) return sign * JvSeries(v, x);
+        if (size < reach) return sign * JvHankel(v, x);
+    }
+    if (size < kUniformFrom) return sign * ByRecurrence(v, x);
+    return sign * (x / v / v > 0.3 ? JvHankel(v, x) : BesselJUniform(v, x));
+}
+
+double BesselY(double v, double x) {
+    if (!std::isfinite(x)) return kQuietNaN;
+    if (x <= 0.0) return DomainError(kQuietNaN);
+    if (!(std::abs(v) <= kLargestInteger + 1.0)) return DomainError(kQuietNaN);
+    if (std::abs(v - std::floor(v)) < 1e-8) {
+        if (v == std::floor(v)) {
+            if (v > kLargestInteger) return DomainError(kQuietNaN);
+            return v < 0.0 && IsOdd(v) ? -BesselYn(-v, x) : BesselYn(std::abs(v), x);
+        }
+        DomainError(v);  // digits are lost below
+    }
+    if (v < kLeastOrder) return DomainError(kQuietNaN);
+    const double j = BesselJ(v, x), reflected = BesselJ(-v, x);
+    if (!std::isfinite(j) || !std::isfinite(reflected)) return kQuietNaN;
+    return (std::cos(kPi * v) * j - reflected) / std::sin(kPi * v);
+}
+
+double SphericalBesselJ(int32_t n, double x) {
+    if (x == kInfinity) return 0.0;
+    if (!std::isfinite(x)) return kQuietNaN;
+    if (x < 0.0) return DomainError(kQuietNaN);
+    if (x == 0.0) return n == 0 ? 1.0 : 0.0;
+    return std::sqrt(1.5707963267948966 / x) * BesselJ(n + 0.5, x);
+}
+
+double SphericalBesselY(int32_t n, double x) {
+    if (x == kInfinity) return 0.0;
+    if (!std::isfinite(x)) return kQuietNaN;
+    if (x < 0.0) return DomainError(kQuietNaN);
+    if (x == 0.0) return DomainError(-kInfinity);
+    return std::sqrt(1.5707963267948966 / x) * BesselY(n + 0.5, x);
+}
+
+}  // namespace krnumer
