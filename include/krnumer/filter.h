@@ -16,6 +16,24 @@
 
 #include <krnumer/types.h>
 
+#pragma pack(push, 1)
+/** A band of an equiripple design; bands follow each other upward. */
+typedef struct KrFirBand {
+    double desired;  /**< the response wanted, not negative; of a differentiator, per unit of normalised frequency */
+    double lowEdge;  /**< where the band begins */
+    double highEdge; /**< where it ends, above lowEdge and below the next band */
+    double weight;   /**< how much errors count, above 0; of a differentiator, relative to the response */
+} KrFirBand;
+
+/** A narrowband filter: a prototype with its taps apart, and an interpolator. */
+typedef struct KrNarrowbandFilter {
+    int32_t type;          /**< 0 lowpass, 1 highpass, 2 bandpass, 3 bandstop, 4 and 5 lowpass and highpass as complements */
+    int32_t factor;        /**< distance of the prototype's taps; with 1 there is no interpolator */
+    KrHandle prototype;    /**< 1-D double */
+    KrHandle interpolator; /**< 1-D double */
+} KrNarrowbandFilter;
+#pragma pack(pop)
+
 /* ---- Recursive filters in closed form --------------------------------------------------------------------------- */
 
 /**
@@ -176,5 +194,100 @@ KRNUMER_API int32_t IIR_Filter2(KrHandle x, const int32_t* structure, KrHandle a
  */
 KRNUMER_API int32_t CxSigIIR_Filter2(KrHandle x, const int32_t* structure, KrHandle a, KrHandle b, KrHandle state,
                                      const uint8_t* init, int32_t* err);
+
+/* ---- Filters without feedback ----------------------------------------------------------------------------------- */
+
+/**
+ * Impulse response of an ideal filter, cut off at `taps` values without any window. With t counted from the middle tap,
+ * w1 = 2 pi fl / fs and w2 = 2 pi fh / fs:
+ *
+ *     lowpass    sin(w1 t) / (pi t)                   w1 / pi in the middle
+ *     highpass  -sin(w1 t) / (pi t)               1 - w1 / pi
+ *     bandpass  (sin(w2 t) - sin(w1 t)) / (pi t)      (w2 - w1) / pi
+ *     bandstop  (sin(w1 t) - sin(w2 t)) / (pi t)  1 - (w2 - w1) / pi
+ *
+ * @param[in]  fs    sampling frequency; any unit that the edges share
+ * @param[in]  fl    cut-off of types 0 and 1; lower edge of types 2 and 3
+ * @param[in]  fh    upper edge of types 2 and 3; types 0 and 1 do not look at it
+ * @param[in]  taps  number of values; odd for types 1 and 3
+ * @param[out] h     1-D double, `taps` values, symmetric; empty on failure
+ * @param[in]  type  0 lowpass, 1 highpass, 2 bandpass, 3 bandstop
+ * @param[out] err   status, by the first that applies: 0; -20021 `taps` below 1; -20001 out of memory; -20061 another
+ *                   type; -20020 an edge above fs/2; -20023 `fs`, `fl` or `fh` not positive, or `fl` not below `fh`;
+ *                   -20033 `taps` even where it has to be odd
+ * @return           0, or the status of the host when it refused the resize
+ */
+KRNUMER_API int32_t FIRCoefs(const double* fs, const double* fl, const double* fh, const int32_t* taps, KrHandle h,
+                             const int32_t* type, int32_t* err);
+
+/**
+ * Equiripple filter: among all filters of its length the one whose largest weighted error over the bands is least, by
+ * the exchange of J. H. McClellan, T. W. Parks and L. R. Rabiner (IEEE Trans. Audio Electroacoust. AU-21, 506, 1973) on
+ * a grid of 16 points per cosine.
+ *
+ * Multiband filters are symmetric; their bands begin at 0 and end at fs/2 (up to 0.001 fs). Differentiators and Hilbert
+ * transformers are antisymmetric. A differentiator approximates desired times f / fs, its weight counting relative to
+ * that. With odd `taps` a differentiator has to end 0.01 fs below fs/2, a Hilbert transformer 0.001 fs, and a Hilbert
+ * transformer always begins above 0.001 fs, since no response is to be had there.
+ *
+ * @param[in]  taps           number of values, 3 to about 4090
+ * @param[in]  fs             sampling frequency
+ * @param[in]  bands          1-D KrFirBand
+ * @param[in]  type           0 multiband, 1 differentiator, 2 Hilbert transformer
+ * @param[out] h              1-D double, `taps` values; empty on failure
+ * @param[out] ripple         the largest error where the weight is 1; NaN on failure
+ * @param[in]  maxIterations  rounds of the exchange, one less than this at the most; 100 when below 1
+ * @param[out] err            status, by the first that applies: 0; -20021 `taps` below 1; -20023 another type; -20031
+ * no bands; -20001 out of memory; -20031 `taps` below 3; -20023 `fs` not positive, an edge or `desired` negative, or
+ * `weight` not positive; -20020 the last edge above fs/2; -20023 edges not ascending; -20031 bands that the type cannot
+ * serve; -20033 even `taps` where a multiband filter shall let pass fs/2; -20001 too many taps; -20031 the exchange
+ * failed or needs more rounds
+ * @return                    0, or 2 when memory ran out in the design or there are too many taps
+ */
+KRNUMER_API int32_t Parks(const int32_t* taps, const double* fs, KrHandle bands, const int32_t* type, KrHandle h,
+                          double* ripple, const int32_t* maxIterations, int32_t* err);
+
+/**
+ * Narrowband filter that costs little: a prototype with its taps a factor apart and an interpolator that removes the
+ * repetitions of its response (Y. Neuvo, C.-Y. Dong, S. K. Mitra, IEEE Trans. Acoust. Speech Signal Process. ASSP-32,
+ * 563, 1984), both equiripple. The factor is the one with the fewest taps; with 1 there is only the prototype. What is
+ * wide is designed as the complement of something narrow.
+ *
+ * @param[in]     fs           sampling frequency
+ * @param[in]     fp           edge of the pass band; of types 2 and 3 its full width around `fc`
+ * @param[in]     fstop        edge of the stop band; of types 2 and 3 its full width around `fc`
+ * @param[in]     fc           centre of types 2 and 3; the others do not look at it
+ * @param[in]     ripple       of the pass band: the response stays within 1 - ripple and 1 + ripple
+ * @param[in]     attenuation  of the stop band in dB
+ * @param[in]     type         0 lowpass, 1 highpass, 2 bandpass, 3 bandstop
+ * @param[in,out] filter       the filter. Its arrays are replaced, and left empty on failure; its type becomes 4 for a
+ *                             lowpass and 5 for a highpass that is a complement
+ * @param[out]    err          status: 0; -20031 `fp` not positive, `fp` not below `fstop` after types 1 and 3 have
+ *                             become their mirrors, `fstop` not below fs/2, another type, `ripple` not positive, an
+ *                             attenuation beyond all numbers, a filter of more than a million taps, or of none; -20001
+ *                             out of memory or too many taps; and what Parks reports
+ * @return                     0
+ */
+KRNUMER_API int32_t FIRNarrowCoef_head(const double* fs, const double* fp, const double* fstop, const double* fc,
+                                       const double* ripple, const double* attenuation, const int32_t* type,
+                                       KrNarrowbandFilter* filter, int32_t* err);
+
+/**
+ * Filters by a narrowband filter: convolution with the interpolator, if there is one, and with the prototype, whose
+ * taps stand `factor` samples apart. For types 3, 4 and 5 the signal itself is added, delayed by half of what the
+ * filter is longer than one sample.
+ *
+ * @param[in]  x       1-D double, n samples
+ * @param[in]  filter  as FIRNarrowCoef_head delivers it
+ * @param[out] y       1-D double: the full convolution, of (np - 1) factor + ni + n - 1 samples for np taps of the
+ *                     prototype and ni of the interpolator, or np + n - 1 with factor 1; empty on failure
+ * @param[out] err     status, by the first that applies: 0; -20003 `x` empty; -20061 `factor` below 1; -20003 a filter
+ *                     without taps; -20001 out of memory
+ * @return             0
+ */
+KRNUMER_API int32_t FIRnarrowFilter_head(KrHandle x, const KrNarrowbandFilter* filter, KrHandle y, int32_t* err);
+
+/** FIRnarrowFilter_head for a complex signal, its parts filtered each for itself. `x` and `y` are 1-D complex. */
+KRNUMER_API int32_t CxSigFIRnarrowFilter_head(KrHandle x, const KrNarrowbandFilter* filter, KrHandle y, int32_t* err);
 
 #endif

@@ -5,7 +5,7 @@
 namespace {
 
 const double kFs = 1000.0, kFl = 50.0, kFh = 120.0, kRipple = 1.0, kAttenuation = 40.0;
-const int32_t kOrder = 3, kBandpass = 2, kBiquads = 0;
+const int32_t kOrder = 3, kBandpass = 2, kBiquads = 0, kComplement = 4;
 const uint8_t kContinue = 1;
 
 }  // namespace
@@ -85,4 +85,38 @@ SWEEP(CxSigIIR_Filter2) {
     const KrHandle x = scene.Replaced(scene.Complexes({{1, 2}, {3, 4}})), a = scene.Doubles({-0.5, 0.25}),
                    b = scene.Doubles({1, 2, 1}), state = scene.Replaced(scene.Complexes({{1, 2}}));
     return scene.Call([&] { return CxSigIIR_Filter2(x, &kBiquads, a, b, state, &kContinue, scene.err()); });
+}
+
+SWEEP(FIRCoefs) {
+    const int32_t taps = 9;
+    const KrHandle h = scene.OutDoubles();
+    return scene.Call([&] { return FIRCoefs(&kFs, &kFl, &kFh, &taps, h, &kBandpass, scene.err()); });
+}
+
+SWEEP(Parks) {
+    const int32_t taps = 12, multiband = 0, rounds = 0;
+    const KrHandle bands = scene.Records<KrFirBand>({{1, 0, 100, 1}, {0, 180, 500, 2}}), h = scene.OutDoubles();
+    double* const ripple = scene.Number();
+    return scene.Call([&] { return Parks(&taps, &kFs, bands, &multiband, h, ripple, &rounds, scene.err()); });
+}
+
+SWEEP(FIRNarrowCoef_head) {
+    const double fp = 10, fstop = 30, fc = 0, ripple = 0.1, attenuation = 30;
+    const int32_t lowpass = 0;
+    KrNarrowbandFilter filter{-1, -1, scene.OutDoubles(), scene.OutDoubles()};
+    return scene.Call([&] {
+        return FIRNarrowCoef_head(&kFs, &fp, &fstop, &fc, &ripple, &attenuation, &lowpass, &filter, scene.err());
+    });
+}
+
+SWEEP(FIRnarrowFilter_head) {
+    const KrHandle x = scene.Doubles({1, 2, 3, 4, 5}), y = scene.OutDoubles();
+    const KrNarrowbandFilter filter{kComplement, 2, scene.Doubles({1, 2, 1}), scene.Doubles({1, 1})};
+    return scene.Call([&] { return FIRnarrowFilter_head(x, &filter, y, scene.err()); });
+}
+
+SWEEP(CxSigFIRnarrowFilter_head) {
+    const KrHandle x = scene.Complexes({{1, 2}, {3, 4}, {5, 6}}), y = scene.OutComplexes();
+    const KrNarrowbandFilter filter{kComplement, 2, scene.Doubles({1, 2, 1}), scene.Doubles({1, 1})};
+    return scene.Call([&] { return CxSigFIRnarrowFilter_head(x, &filter, y, scene.err()); });
 }
