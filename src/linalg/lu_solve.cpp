@@ -1,0 +1,176 @@
+#include "linalg/lu_solve.h"
+
+#include <algorithm>
+#include <functional>
+#include <utility>
+
+#include "frame/numeric.h"
+#include "frame/scratch.h"
+#include "frame/status.h"
+#include "linalg/element.h"
+#include "linalg/factor_kernels.h"
+#include "linalg/lu.h"
+
+namespace krnumer {
+namespace {
+
+// Forward substitution takes this many rows at a time: their sums over what is known already run side by side.
+constexpr size_t kTogether = 4;
+
+template <class T>
+void SolveUnitLower(const T* lu, size_t n, T* x) {
+    for (size_t first = 0; first < n; first += kTogether) {
+        const size_t count = std::min(kTogether, n - first);
+        const T* const rows = lu + first * n;
+        T sums[kTogether]{};
+        if (count == kTogether) {
+            for (size_t j = 0; j < first; ++j)
+                for (size_t row = 0; row < kTogether; ++row) sums[row] += rows[row * n + j] * x[j];
+        } else {
+            for (size_t row = 0; row < count; ++row)
+                for (size_t j = 0; j < first; ++j) sums[row] += rows[row * n + j] * x[j];
+        }
+        for (size_t row = 0; row < count; ++row) {
+            for (size_t j = first; j < first + row; ++j) sums[row] += rows[row * n + j] * x[j];
+            x[first + row] -= sums[row];
+        }
+    }
+}
+
+template <class T>
+int32_t SolveUpper(const T* lu, size_t n, T* x) {
+    for (size_t i = n; i-- > 0;) {
+        const T* const row = lu + i * n;
+        if (row[i] == T{}) return kSingular;
+        T sum{};
+        for (size_t j = i + 1; j < n; ++j) sum += row[j] * x[j];
+        x[i] = (x[i] - sum) / row[i];
+    }
+    return kOk;
+}
+
+// The two substitutions on all columns of a matrix at once, each column by the same operations as above.
+template <class T>
+class ManyColumns {
+  public:
+    // sums: kTogether rows of n elements.
+    ManyColumns(const T* lu, size_t n, T* x, T* sums) : lu_(lu), n_(n), x_(x), sums_(sums) {}
+
+    void SolveUnitLower() {
+        for (size_t first = 0; first < n_; first += kTogether) {
+            const size_t count = std::min(kTogether, n_ - first);
+            std::fill_n(sums_, count * n_, T{});
+            SubtractTerms(first, count, 0, first, sums_);
+            for (size_t row = 0; row < count; ++row) {
+                T* const sum = sums_ + row * n_;
+                SubtractTerms(first + row, 1, first, first + row, sum);
+                std::transform(Row(first + row), Row(first + row + 1), sum, Row(first + row), std::plus<>());
+            }
+        }
+    }
+
+    void SolveUpper() {
+        for (size_t i = n_; i-- > 0;) {
+            const T pivot = lu_[i * n_ + i];
+            if (pivot == T{}) return;
+            std::fill_n(sums_, n_, T{});
+            SubtractTerms(i, 1, i + 1, n_, sums_);
+            for (size_t j = 0; j < n_; ++j) Row(i)[j] = (Row(i)[j] + sums_[j]) / pivot;
+        }
+    }
+
+  private:
+    T* Row(size_t i) { return x_ + i * n_; }
+
+    // sums -= rows of the factor, from column `term` up to `end`, times the rows of X with these numbers.
+    void SubtractTerms(size_t row, size_t rows, size_t term, size_t end, T* sums) {
+        if (term == end) return;
+        SubtractProduct(ProductOperands<T>{.c = sums,
+                                           .c_row = {n_},
+                                           .a = lu_ + row * n_ + term,
+                                           .a_row = n_,
+                                           .a_term = {1},
+                                           .b = Row(term),
+                                           .b_term = {n_},
+                                           .rows = rows,
+                                           .columns = n_,
+                                           .terms = end - term});
+    }
+
+    const T* lu_;
+    size_t n_;
+    T* x_;
+    T* sums_;
+};
+
+}  // namespace
+
+int32_t CheckPivots(const int32_t* pivots, int32_t n) {
+    const bool fit = std::all_of(pivots, pivots + Count(n), [n](int32_t row) { return row >= 0 && row < n; });
+    return fit ? kOk : kBadIndex;
+}
+
+template <class T>
+int32_t LUSolve(const T* lu, const int32_t* pivots, const T* b, int32_t n, T* x) {
+    if (n < 1) return kEmptyInput;
+    if (x != b) std::copy_n(b, n, x);
+    for (size_t i = 0; i < Count(n); ++i) std::swap(x[i], x[Count(pivots[i])]);
+    SolveUnitLower(lu, Count(n), x);
+    return SolveUpper(lu, Count(n), x);
+}
+
+template <class T>
+int32_t LUInverse(const T* lu, const int32_t* pivots, int32_t order, T* inverse) {
+    if (order < 1) return kEmptyInput;
+    const size_t n = Count(order);
+    Scratch<T> sums(kTogether * n), factors;
+    if (!sums) return kOutOfMemory;
+    if (inverse == lu) {
+        if (!factors.Allocate(n * n)) return kOutOfMemory;
+        std::copy_n(lu, n * n, factors.data());
+        lu = factors.data();
+    }
+    std::fill_n(inverse, n * n, T{});
+    for (size_t i = 0; i < n; ++i) inverse[i * (n + 1)] = FromReal<T>(1.0);
+    for (size_t i = 0; i < n; ++i) {
+        const size_t other = Count(pivots[i]);
+        if (other != i) std::swap_ranges(inverse + i * n, inverse + (i + 1) * n, inverse + other * n);
+    }
+    ManyColumns<T> columns(lu, n, inverse, sums.data());
+    columns.SolveUnitLower();
+    columns.SolveUpper();
+    return kOk;
+}
+
+template <class T>
+int32_t LUSolveDirect(const T* a, int32_t n, const T* b, T* x) {
+    if (n < 1) return kEmptyInput;
+    Scratch<T> factors(Count(n) * Count(n));
+    Scratch<int32_t> pivots(Count(n));
+    if (!factors || !pivots) return kOutOfMemory;
+    std::copy_n(a, Count(n) * Count(n), factors.data());
+    int32_t parity = 0;
+    if (LUFactor(factors.data(), n, pivots.data(), &parity) == kWarnZeroPivot) return kSingular;
+    return LUSolve(factors.data(), pivots.data(), b, n, x);
+}
+
+template <class T>
+int32_t InvertByLU(T* a, int32_t n) {
+    if (n < 1) return kEmptyInput;
+    Scratch<int32_t> pivots(Count(n));
+    if (!pivots) return kOutOfMemory;
+    int32_t parity = 0;
+    if (LUFactor(a, n, pivots.data(), &parity) == kWarnZeroPivot) return kSingular;
+    return LUInverse(a, pivots.data(), n, a);
+}
+
+#define KRNUMER_INSTANTIATE(T)                                                 \
+    template int32_t LUSolve(const T*, const int32_t*, const T*, int32_t, T*); \
+    template int32_t LUInverse(const T*, const int32_t*, int32_t, T*);         \
+    template int32_t LUSolveDirect(const T*, int32_t, const T*, T*);           \
+    template int32_t InvertByLU(T*, int32_t);
+KRNUMER_INSTANTIATE(double)
+KRNUMER_INSTANTIATE(Complex)
+#undef KRNUMER_INSTANTIATE
+
+}  // namespace krnumer
