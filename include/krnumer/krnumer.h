@@ -12,6 +12,7 @@
 #include <krnumer/integration.h>
 #include <krnumer/interpolation.h>
 #include <krnumer/linalg.h>
+#include <krnumer/linear_fit.h>
 #include <krnumer/measure.h>
 #include <krnumer/noise.h>
 #include <krnumer/peak.h>
