@@ -1,94 +1,146 @@
+// Compiled once for every kind of vector unit that the machine may have. No products are fused, so every unit gives the
+// same.
 #include "linalg/reflector_chain.h"
 
-namespace krnumer {
+// Strips are arrays of vectors, which takes vectors of a size that is known now.
+#define HWY_DISABLED_TARGETS (HWY_SVE | HWY_SVE_256 | HWY_SVE2 | HWY_SVE2_128 | HWY_RVV)
+#undef HWY_TARGET_INCLUDE
+#define HWY_TARGET_INCLUDE "linalg/reflector_chain.cpp"
+#include <hwy/foreach_target.h>
+#include <hwy/highway.h>
 
+#include "linalg/strips-inl.h"
+
+HWY_BEFORE_NAMESPACE();
+namespace krnumer::HWY_NAMESPACE {
 namespace {
+
+namespace hn = hwy::HWY_NAMESPACE;
 
 enum class Side { kLeft, kRight };
 
-// The sum of products that a reflector takes, and what it subtracts, on the first, second and third element.
-template <Side side>
-double Sum(const BulgeReflector& f, double a, double b, double c) {
-    if constexpr (side == Side::kLeft) {
-        return a + f.q * b + f.r * c;
-    } else {
-        return f.x * a + f.y * b + f.z * c;
-    }
-}
-template <Side side>
-double Sum(const BulgeReflector& f, double a, double b) {
-    if constexpr (side == Side::kLeft) {
-        return a + f.q * b;
-    } else {
-        return f.x * a + f.y * b;
-    }
-}
-template <Side side>
-double First(const BulgeReflector& f, double p) {
-    return side == Side::kLeft ? p * f.x : p;
-}
-template <Side side>
-double Second(const BulgeReflector& f, double p) {
-    return p * (side == Side::kLeft ? f.y : f.q);
-}
-template <Side side>
-double Third(const BulgeReflector& f, double p) {
-    return p * (side == Side::kLeft ? f.z : f.r);
-}
+// A reflector in every lane: the weights of the sum of products that it takes, and of what it subtracts. The first
+// weight of one of the two is 1.
+template <Side side, class D>
+struct Weights {
+    using V = hn::Vec<D>;
 
-// A bundle of `size` lines through the whole chain. Lines are `line_step` apart, the elements that a reflector takes
-// together `step`. The two elements that the next reflector shares stay in registers.
-template <Side side, int size>
-void ReflectBundle(const ReflectorChain& chain, double* first, std::ptrdiff_t step, std::ptrdiff_t line_step) {
-    double a[size], b[size];
-    for (int i = 0; i < size; ++i) a[i] = first[i * line_step];
-    for (int i = 0; i < size; ++i) b[i] = first[i * line_step + step];
-    const BulgeReflector* const last = chain.reflectors + chain.count - (chain.ends_short ? 1 : 0);
-    for (const BulgeReflector* f = chain.reflectors; f != last; ++f, first += step) {
-        double c[size], p[size];
-        for (int i = 0; i < size; ++i) c[i] = first[i * line_step + 2 * step];
-        for (int i = 0; i < size; ++i) p[i] = Sum<side>(*f, a[i], b[i], c[i]);
-        for (int i = 0; i < size; ++i) first[i * line_step] = a[i] - First<side>(*f, p[i]);
-        for (int i = 0; i < size; ++i) a[i] = b[i] - Second<side>(*f, p[i]);
-        for (int i = 0; i < size; ++i) b[i] = c[i] - Third<side>(*f, p[i]);
-    }
-    if (chain.ends_short) {
-        for (int i = 0; i < size; ++i) {
-            const double p = Sum<side>(*last, a[i], b[i]);
-            a[i] -= First<side>(*last, p);
-            b[i] -= Second<side>(*last, p);
+    HWY_INLINE Weights(D d, const BulgeReflector& f)
+        : x(hn::Set(d, f.x)), y(hn::Set(d, f.y)), z(hn::Set(d, f.z)), q(hn::Set(d, f.q)), r(hn::Set(d, f.r)) {}
+
+    HWY_INLINE V Sum(V a, V b) const {
+        if constexpr (side == Side::kLeft) {
+            return hn::Add(a, hn::Mul(q, b));
+        } else {
+            return hn::Add(hn::Mul(x, a), hn::Mul(y, b));
         }
     }
-    for (int i = 0; i < size; ++i) first[i * line_step] = a[i];
-    for (int i = 0; i < size; ++i) first[i * line_step + step] = b[i];
+    HWY_INLINE V Sum(V a, V b, V c) const { return hn::Add(Sum(a, b), hn::Mul(side == Side::kLeft ? r : z, c)); }
+    HWY_INLINE V First(V p) const { return side == Side::kLeft ? hn::Mul(p, x) : p; }
+    HWY_INLINE V Second(V p) const { return hn::Mul(p, side == Side::kLeft ? y : q); }
+    HWY_INLINE V Third(V p) const { return hn::Mul(p, side == Side::kLeft ? z : r); }
+
+    V x, y, z, q, r;
+};
+
+// One strip of columns through the whole chain: the two rows that the next reflector shares stay in registers.
+template <Side side>
+struct ReflectStrip {
+    const ReflectorChain& chain;
+    std::ptrdiff_t stride;
+
+    template <int kVectors, class D>
+    HWY_INLINE void Run(D d, double* row) const {
+        using V = hn::Vec<D>;
+        const auto lanes = static_cast<std::ptrdiff_t>(hn::MaxLanes(d));
+        V a[kVectors], b[kVectors];
+        for (int i = 0; i < kVectors; ++i) a[i] = hn::LoadU(d, row + i * lanes);
+        for (int i = 0; i < kVectors; ++i) b[i] = hn::LoadU(d, row + stride + i * lanes);
+        const BulgeReflector* const last = chain.reflectors + chain.count - (chain.ends_short ? 1 : 0);
+        for (const BulgeReflector* f = chain.reflectors; f != last; ++f, row += stride) {
+            const Weights<side, D> weights(d, *f);
+            for (int i = 0; i < kVectors; ++i) {
+                const V c = hn::LoadU(d, row + 2 * stride + i * lanes);
+                const V p = weights.Sum(a[i], b[i], c);
+                hn::StoreU(hn::Sub(a[i], weights.First(p)), d, row + i * lanes);
+                a[i] = hn::Sub(b[i], weights.Second(p));
+                b[i] = hn::Sub(c, weights.Third(p));
+            }
+        }
+        if (chain.ends_short) {
+            const Weights<side, D> weights(d, *last);
+            for (int i = 0; i < kVectors; ++i) {
+                const V p = weights.Sum(a[i], b[i]);
+                a[i] = hn::Sub(a[i], weights.First(p));
+                b[i] = hn::Sub(b[i], weights.Second(p));
+            }
+        }
+        for (int i = 0; i < kVectors; ++i) hn::StoreU(a[i], d, row + i * lanes);
+        for (int i = 0; i < kVectors; ++i) hn::StoreU(b[i], d, row + stride + i * lanes);
+    }
+};
+
+void ReflectLeft(const ReflectorChain& chain, double* rows, std::ptrdiff_t stride, std::ptrdiff_t width) {
+    ForEachStrip(rows, width, ReflectStrip<Side::kLeft>{chain, stride});
 }
 
-template <Side side>
-void ReflectStrips(const ReflectorChain& chain, double* rows, std::ptrdiff_t stride, std::ptrdiff_t width) {
-    constexpr int kWide = 8;
-    constexpr int kNarrow = 2;
-    std::ptrdiff_t j = 0;
-    for (; j + kWide <= width; j += kWide) ReflectBundle<side, kWide>(chain, rows + j, stride, 1);
-    for (; j + kNarrow <= width; j += kNarrow) ReflectBundle<side, kNarrow>(chain, rows + j, stride, 1);
-    for (; j < width; ++j) ReflectBundle<side, 1>(chain, rows + j, stride, 1);
+void ReflectRight(const ReflectorChain& chain, double* rows, std::ptrdiff_t stride, std::ptrdiff_t width) {
+    ForEachStrip(rows, width, ReflectStrip<Side::kRight>{chain, stride});
+}
+
+}  // namespace
+}  // namespace krnumer::HWY_NAMESPACE
+HWY_AFTER_NAMESPACE();
+
+#if HWY_ONCE
+
+namespace krnumer {
+
+HWY_EXPORT(ReflectLeft);
+HWY_EXPORT(ReflectRight);
+
+void ReflectRowsByChain(const ReflectorChain& chain, double* rows, std::ptrdiff_t stride, std::ptrdiff_t width) {
+    HWY_DYNAMIC_DISPATCH(ReflectLeft)(chain, rows, stride, width);
+}
+
+void ReflectTransposedByChain(const ReflectorChain& chain, double* rows, std::ptrdiff_t stride, std::ptrdiff_t width) {
+    HWY_DYNAMIC_DISPATCH(ReflectRight)(chain, rows, stride, width);
+}
+
+namespace {
+
+// A few rows through the whole chain, side by side.
+template <int rows>
+void ReflectRowGroup(const ReflectorChain& chain, double* first, std::ptrdiff_t stride) {
+    double a[rows], b[rows];
+    for (int i = 0; i < rows; ++i) a[i] = first[i * stride];
+    for (int i = 0; i < rows; ++i) b[i] = first[i * stride + 1];
+    const BulgeReflector* const last = chain.reflectors + chain.count - (chain.ends_short ? 1 : 0);
+    for (const BulgeReflector* f = chain.reflectors; f != last; ++f, ++first) {
+        for (int i = 0; i < rows; ++i) {
+            const double c = first[i * stride + 2];
+            const double p = f->x * a[i] + f->y * b[i] + f->z * c;
+            first[i * stride] = a[i] - p;
+            a[i] = b[i] - p * f->q;
+            b[i] = c - p * f->r;
+        }
+    }
+    for (int i = 0; i < rows; ++i) {
+        const double p = chain.ends_short ? last->x * a[i] + last->y * b[i] : 0.0;
+        first[i * stride] = a[i] - p;
+        first[i * stride + 1] = chain.ends_short ? b[i] - p * last->q : b[i];
+    }
 }
 
 }  // namespace
 
-void ReflectRowsByChain(const ReflectorChain& chain, double* rows, std::ptrdiff_t stride, std::ptrdiff_t width) {
-    ReflectStrips<Side::kLeft>(chain, rows, stride, width);
-}
-
-void ReflectTransposedByChain(const ReflectorChain& chain, double* rows, std::ptrdiff_t stride, std::ptrdiff_t width) {
-    ReflectStrips<Side::kRight>(chain, rows, stride, width);
-}
-
 void ReflectColumnsByChain(const ReflectorChain& chain, double* rows, std::ptrdiff_t stride, std::ptrdiff_t height) {
     constexpr int kTogether = 4;
     std::ptrdiff_t i = 0;
-    for (; i + kTogether <= height; i += kTogether)
-        ReflectBundle<Side::kRight, kTogether>(chain, rows + i * stride, 1, stride);
-    for (; i < height; ++i) ReflectBundle<Side::kRight, 1>(chain, rows + i * stride, 1, stride);
+    for (; i + kTogether <= height; i += kTogether) ReflectRowGroup<kTogether>(chain, rows + i * stride, stride);
+    for (; i < height; ++i) ReflectRowGroup<1>(chain, rows + i * stride, stride);
 }
 
 }  // namespace krnumer
+
+#endif

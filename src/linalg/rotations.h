@@ -13,13 +13,10 @@ namespace krnumer {
 inline double Hypotenuse(double a, double b) {
     const double p = std::fabs(a);
     const double q = std::fabs(b);
-    if (p > q) {
-        const double ratio = q / p;
-        return p * std::sqrt(1.0 + ratio * ratio);
-    }
-    if (q == 0.0) return 0.0;
-    const double ratio = p / q;
-    return q * std::sqrt(1.0 + ratio * ratio);
+    const double larger = p > q ? p : q;
+    const double smaller = p > q ? q : p;
+    const double ratio = smaller / larger;
+    return larger == 0.0 ? 0.0 : larger * std::sqrt(1.0 + ratio * ratio);
 }
 
 // Vectors as consecutive rows of `length` doubles; no rows where only values are wanted.
