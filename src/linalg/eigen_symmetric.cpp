@@ -7,13 +7,14 @@
 #include <utility>
 
 #include "frame/numeric.h"
-#include "frame/scratch.h"
 #include "frame/status.h"
 #include "linalg/element.h"
 #include "linalg/finite.h"
 #include "linalg/householder.h"
 #include "linalg/rotations.h"
+#include "linalg/transpose.h"
 #include "linalg/tridiagonal.h"
+#include "linalg/workspace.h"
 
 namespace krnumer {
 
@@ -141,26 +142,27 @@ void SortAscending(double* w, std::ptrdiff_t n, std::ptrdiff_t* order) {
 
 template <class T>
 int32_t HermitianEigen(const T* a, int32_t order_of_a, int32_t want_vectors, double* w, T* v) {
-    constexpr std::ptrdiff_t kParts = sizeof(T) / sizeof(double);
     constexpr Negligible kNegligible = kIsComplex<T> ? Negligible::kAgainstLargest : Negligible::kInSum;
 
     if (order_of_a < 1) return kEmptyInput;
     if (want_vectors != 0 && want_vectors != 1) return kBadSelector;
-    const std::ptrdiff_t n = order_of_a;
     if constexpr (!kIsComplex<T>) {
         if (HasUnusable(a, Count(order_of_a) * Count(order_of_a))) return kNotFinite;
     }
 
-    // The square serves as the copy of A without vectors, and with them for the vectors as rows.
-    Scratch<double> block(static_cast<std::size_t>(kParts * n * (n + 2) + 5 * n));
-    if (!block) return kOutOfMemory;
-    double* next = block.data();
-    const auto doubles = [&next](std::ptrdiff_t count) { return std::exchange(next, next + count); };
-    const auto elements = [&](std::ptrdiff_t count) { return reinterpret_cast<T*>(doubles(kParts * count)); };
-    T* square = elements(n * n);
-
+    const std::ptrdiff_t n = order_of_a;
     const bool vectors = want_vectors == 1;
-    const Tridiagonal<T> tridiagonal{vectors ? v : square, n, w, doubles(n), doubles(n), elements(n), elements(n)};
+    Workspace<T> work((n + 2) * n, 5 * n);
+    if (!work) return kOutOfMemory;
+    T* square = work.Elements(n * n);  // without vectors the copy of A, with them the vectors as rows
+
+    const Tridiagonal<T> tridiagonal{.a = vectors ? v : square,
+                                     .n = n,
+                                     .diagonal = w,
+                                     .subdiagonal = work.Doubles(n),
+                                     .h = work.Doubles(n),
+                                     .phase = work.Elements(n),
+                                     .row = work.Elements(n)};
     if (tridiagonal.a != a) std::copy_n(a, n * n, tridiagonal.a);
     if constexpr (kIsComplex<T>) {
         for (std::ptrdiff_t i = 0; i < n; ++i) tridiagonal.Row(i)[i].im = 0.0;
@@ -173,12 +175,13 @@ int32_t HermitianEigen(const T* a, int32_t order_of_a, int32_t want_vectors, dou
     }
 
     Accumulate(tridiagonal);
-    ColumnsToRows(v, n, n, square);
+    TransposeCore<T>(v, order_of_a, order_of_a, square);
     const VectorRows rows(square, n);
-    const int32_t status = DiagonaliseTridiagonal(n, w, tridiagonal.subdiagonal, rows, doubles(2 * n), kNegligible);
+    const int32_t status =
+        DiagonaliseTridiagonal(n, w, tridiagonal.subdiagonal, rows, work.Doubles(2 * n), kNegligible);
     if (status != kOk) return status;
     Normalise(rows, n);
-    auto* order = reinterpret_cast<std::ptrdiff_t*>(doubles(n));
+    std::ptrdiff_t* order = work.Indices(n);
     std::iota(order, order + n, 0);
     SortAscending(w, n, order);
     RowsToColumns(square, order, n, n, v);

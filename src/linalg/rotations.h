@@ -43,13 +43,6 @@ void RowsToColumns(const T* rows, const std::ptrdiff_t* order, std::ptrdiff_t n,
     }
 }
 
-// out = the n columns of a (row-major, m by n) as rows.
-template <class T>
-void ColumnsToRows(const T* a, std::ptrdiff_t m, std::ptrdiff_t n, T* out) {
-    for (std::ptrdiff_t i = 0; i < m; ++i)
-        for (std::ptrdiff_t j = 0; j < n; ++j) out[j * m + i] = a[i * n + j];
-}
-
 // x' = x c + y s and y' = y c - x s on two rows.
 void RotateRows(double* x, double* y, std::ptrdiff_t length, double c, double s);
 

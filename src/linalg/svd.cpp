@@ -8,7 +8,9 @@
 #include "frame/status.h"
 #include "linalg/element.h"
 #include "linalg/finite.h"
+#include "linalg/qr.h"
 #include "linalg/svd_engine.h"
+#include "linalg/transpose.h"
 
 namespace krnumer {
 
@@ -20,23 +22,36 @@ int32_t CheckInput(const T* a, int32_t m, int32_t n) {
     return HasUnusable(a, Count(m) * Count(n)) ? kNotFinite : kOk;
 }
 
-// out (n by m) = A^H.
-template <class T>
-void ConjugateTranspose(const T* a, std::size_t m, std::size_t n, T* out) {
-    for (std::size_t i = 0; i < m; ++i)
-        for (std::size_t j = 0; j < n; ++j) out[j * m + i] = Conjugate(a[i * n + j]);
-}
-
 // The decomposition of a tall matrix, or that of the conjugate transpose of a wide one, where the singular vectors
 // change sides. `longer` (max by min) takes the vectors of the longer side, `shorter` (square) the others.
 template <class T>
 int32_t DecomposeThin(const T* a, int32_t m, int32_t n, T* longer, double* s, T* shorter) {
     if (m < n) {
-        ConjugateTranspose(a, Count(m), Count(n), longer);
+        ConjTransposeCore(a, m, n, longer);
     } else if (longer != a) {
         std::copy_n(a, Count(m) * Count(n), longer);
     }
     return DecomposeTall(longer, std::max(m, n), std::min(m, n), s, shorter);
+}
+
+// Adds columns to the q orthonormal ones of `thin` (p by q) until they span the whole space: p by p.
+template <class T>
+int32_t CompleteBasis(const T* thin, int32_t p, int32_t q, T* basis) {
+    const std::size_t rows = Count(p), columns = Count(q);
+    Scratch<T> r(rows * columns);
+    if (!r) return kOutOfMemory;
+    if (const int32_t status = QRHouseholder(thin, p, q, kFullQR, basis, r.data())) return status;
+    for (std::size_t i = 0; i < rows; ++i) {
+        for (std::size_t j = 0; j < columns; ++j) {
+            T& element = basis[i * rows + j];
+            if constexpr (kIsComplex<T>) {
+                element = thin[i * columns + j];
+            } else if (r[j * columns + j] < 0.0) {
+                element = -element;
+            }
+        }
+    }
+    return kOk;
 }
 
 }  // namespace
@@ -48,7 +63,11 @@ int32_t SvdCore(const T* a, int32_t m, int32_t n, T* u, double* s, T* v, bool fu
     T* shorter = m < n ? u : v;
     if (!full || m == n) return DecomposeThin(a, m, n, longer, s, shorter);
 
-    return kNotProvided;  // completing the basis of a matrix that is not square takes a QR decomposition
+    const int32_t p = std::max(m, n), q = std::min(m, n);
+    Scratch<T> thin(Count(p) * Count(q));
+    if (!thin) return kOutOfMemory;
+    if (const int32_t status = DecomposeThin(a, m, n, thin.data(), s, shorter)) return status;
+    return CompleteBasis(thin.data(), p, q, longer);
 }
 
 template <class T>

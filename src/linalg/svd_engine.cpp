@@ -5,12 +5,13 @@
 #include <numeric>
 #include <utility>
 
-#include "frame/scratch.h"
 #include "frame/status.h"
 #include "linalg/element.h"
 #include "linalg/householder.h"
 #include "linalg/rotations.h"
 #include "linalg/svd_bidiagonal.h"
+#include "linalg/transpose.h"
+#include "linalg/workspace.h"
 
 namespace krnumer {
 
@@ -110,20 +111,25 @@ void SortDescending(double* w, std::ptrdiff_t n, std::ptrdiff_t* order) {
 }  // namespace
 
 template <class T>
-int32_t DecomposeTall(T* a, std::ptrdiff_t m, std::ptrdiff_t n, double* s, T* v) {
-    constexpr std::ptrdiff_t kParts = kIsComplex<T> ? 2 : 1;  // doubles per element
+int32_t DecomposeTall(T* a, int32_t rows, int32_t columns, double* s, T* v) {
+    const std::ptrdiff_t m = rows, n = columns;
+    const bool vectors = v != nullptr;
+    Workspace<T> work(3 * n + (vectors ? (m + n) * n : 0), 3 * n + (vectors ? 5 * n : 0));
+    if (!work) return kOutOfMemory;
 
-    const std::ptrdiff_t vectors = v != nullptr ? kParts * (m + n) * n + 5 * n : 0;
-    Scratch<double> block(static_cast<std::size_t>((3 + 3 * kParts) * n + vectors));
-    if (!block) return kOutOfMemory;
-    double* next = block.data();
-    const auto doubles = [&next](std::ptrdiff_t count) { return std::exchange(next, next + count); };
-    const auto elements = [&](std::ptrdiff_t count) { return reinterpret_cast<T*>(doubles(kParts * count)); };
-
-    const Reduction<T> reduction{a, m, n, s, doubles(n), doubles(n), doubles(n), elements(n), elements(n), elements(n)};
+    const Reduction<T> reduction{.a = a,
+                                 .m = m,
+                                 .n = n,
+                                 .diagonal = s,
+                                 .superdiagonal = work.Doubles(n),
+                                 .left_h = work.Doubles(n),
+                                 .right_h = work.Doubles(n),
+                                 .left_phase = work.Elements(n),
+                                 .right_phase = work.Elements(n),
+                                 .row = work.Elements(n)};
     const Bidiagonal bidiagonal{n, s, reduction.superdiagonal};
     Bidiagonalise(reduction);
-    if (v == nullptr) {
+    if (!vectors) {
         const int32_t status = DiagonaliseBidiagonal(bidiagonal, {}, {}, nullptr);
         if (status == kOk) SortDescending(s, n, nullptr);
         return status;
@@ -131,15 +137,14 @@ int32_t DecomposeTall(T* a, std::ptrdiff_t m, std::ptrdiff_t n, double* s, T* v)
 
     AccumulateRight(reduction, v);
     AccumulateLeft(reduction);
-    T* left = elements(m * n);
-    T* right = elements(n * n);
-    ColumnsToRows(a, m, n, left);
-    ColumnsToRows(v, n, n, right);
-    double* rotations = doubles(4 * n);
-    const int32_t status = DiagonaliseBidiagonal(bidiagonal, {left, m}, {right, n}, rotations);
+    T* left = work.Elements(m * n);
+    T* right = work.Elements(n * n);
+    TransposeCore<T>(a, rows, columns, left);
+    TransposeCore<T>(v, columns, columns, right);
+    const int32_t status = DiagonaliseBidiagonal(bidiagonal, {left, m}, {right, n}, work.Doubles(4 * n));
     if (status != kOk) return status;
 
-    auto* order = reinterpret_cast<std::ptrdiff_t*>(doubles(n));
+    std::ptrdiff_t* order = work.Indices(n);
     std::iota(order, order + n, 0);
     SortDescending(s, n, order);
     RowsToColumns(left, order, n, m, a);
@@ -147,7 +152,7 @@ int32_t DecomposeTall(T* a, std::ptrdiff_t m, std::ptrdiff_t n, double* s, T* v)
     return kOk;
 }
 
-template int32_t DecomposeTall(double*, std::ptrdiff_t, std::ptrdiff_t, double*, double*);
-template int32_t DecomposeTall(Complex*, std::ptrdiff_t, std::ptrdiff_t, double*, Complex*);
+template int32_t DecomposeTall(double*, int32_t, int32_t, double*, double*);
+template int32_t DecomposeTall(Complex*, int32_t, int32_t, double*, Complex*);
 
 }  // namespace krnumer

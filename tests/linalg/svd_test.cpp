@@ -40,7 +40,7 @@ class Svd : public ::testing::Test {
     static void ExpectDecomposition(const DenseMatrix<T>& a) {
         const double units = kEpsilon * std::max(a.rows, a.columns);
         const double norm = FrobeniusNorm(a);
-        for (const bool full : {false}) {
+        for (const bool full : {false, true}) {
             const Decomposed<T> d = Decompose(a, full);
             ASSERT_EQ(d.status, kOk);
             EXPECT_LE(Distance(Product(ColumnsScaled(d.u, d.s), LeadingRows(Adjoint(d.v), d.s.size())), a),
@@ -120,6 +120,23 @@ TYPED_TEST(Svd, DecomposesTriangularAndRepeatedValues) {
     this->ExpectDecomposition(Generate<T>(20, 20, [](int32_t i, int32_t j) { return FromReal<T>(i == j); }));
     this->ExpectDecomposition(Generate<T>(30, 12, [](int32_t, int32_t) { return FromReal<T>(2.0); }));
     this->ExpectDecomposition(Generate<T>(12, 12, [](int32_t i, int32_t j) { return FromReal<T>((i + 5) % 12 == j); }));
+}
+
+TYPED_TEST(Svd, CompletesTheFullFormWithoutTouchingTheThinOne) {
+    using T = TypeParam;
+    for (const auto& [m, n] : {std::pair{5, 2}, {2, 5}, {30, 1}, {1, 30}, {17, 16}}) {
+        const DenseMatrix<T> a = RandomMatrix<T>(m, n, 7);
+        const Decomposed<T> thin = Decompose(a);
+        const Decomposed<T> full = Decompose(a, true);
+        ASSERT_EQ(full.status, kOk);
+        EXPECT_EQ(full.s, thin.s);
+        for (const auto& [part, whole] : {std::pair{&thin.u, &full.u}, {&thin.v, &full.v}}) {
+            EXPECT_EQ(whole->rows, whole->columns);
+            for (int32_t i = 0; i < part->rows; ++i)
+                for (int32_t j = 0; j < part->columns; ++j)
+                    EXPECT_NEAR(SumOfParts((*whole)(i, j) - (*part)(i, j)), 0.0, 1e-14);
+        }
+    }
 }
 
 TYPED_TEST(Svd, LeavesTheMatrixAsItWas) {
