@@ -16,6 +16,7 @@
 #include <krnumer/measure.h>
 #include <krnumer/noise.h>
 #include <krnumer/peak.h>
+#include <krnumer/polynomial.h>
 #include <krnumer/sigop.h>
 #include <krnumer/special.h>
 #include <krnumer/spectrum.h>

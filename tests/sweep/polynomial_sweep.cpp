@@ -1,0 +1,41 @@
+#include "krnumer/polynomial.h"
+
+#include "sweep/sweep.h"
+
+SWEEP(PolyEv) {
+    const KrHandle x = scene.Replaced(scene.Doubles({1, 2, 3}));
+    const KrHandle coef = scene.Doubles({1, -2, 0.5});
+    return scene.Call([&] { return PolyEv(x, coef, scene.err()); });
+}
+
+SWEEP(EvPoly2D) {
+    const KrHandle x = scene.Replaced(scene.Matrix(2, 2, {1, 2, 3, 4}));
+    const KrHandle coef = scene.Doubles({1, -2, 0.5});
+    return scene.Call([&] { return EvPoly2D(x, coef, scene.err()); });
+}
+
+SWEEP(PolyRootsNtBst_head) {
+    const KrHandle coef = scene.Doubles({-24, 26, -15, 6, -1, 0.1});
+    const KrHandle guesses = scene.Doubles({1.5});
+    const KrHandle pairs = scene.Complexes({{1, 1}, {1, -1}, {2, 0}});
+    const KrHandle roots = scene.OutComplexes();
+    return scene.Call([&] { return PolyRootsNtBst_head(coef, guesses, 20, 1e-12, pairs, 20, 1e-12, roots); });
+}
+
+SWEEP(PolyGCD_H) {
+    const KrHandle p = scene.Doubles({0, -6, 1, 1});
+    const KrHandle q = scene.Doubles({0, -2, -1, 1});
+    const KrHandle gcd = scene.OutDoubles();
+    const KrHandle u = scene.OutDoubles();
+    const KrHandle v = scene.OutDoubles();
+    return scene.Call([&] { return PolyGCD_H(p, q, -1.0, gcd, u, v, 1); });
+}
+
+SWEEP(CxPolyGCD_H) {
+    const KrHandle p = scene.Complexes({{0, 2}, {-2, -1}, {1, 0}});
+    const KrHandle q = scene.Complexes({{0, 3}, {-3, -1}, {1, 0}});
+    const KrHandle gcd = scene.OutComplexes();
+    const KrHandle u = scene.OutComplexes();
+    const KrHandle v = scene.OutComplexes();
+    return scene.Call([&] { return CxPolyGCD_H(p, q, -1.0, gcd, u, v, 1); });
+}
