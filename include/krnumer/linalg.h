@@ -15,6 +15,7 @@
 #include <krnumer/linalg_basic.h>
 #include <krnumer/linalg_eigen.h>
 #include <krnumer/linalg_factor.h>
+#include <krnumer/linalg_measures.h>
 #include <krnumer/linalg_svd.h>
 
 #endif

@@ -8,6 +8,7 @@
 #include "linalg/eigen_symmetric.h"
 #include "linalg/finite.h"
 #include "linalg/lu.h"
+#include "linalg/measures.h"
 #include "linalg/packed.h"
 #include "linalg/products.h"
 #include "linalg/qr.h"
@@ -27,6 +28,7 @@ inline constexpr auto& CxUnpackTriangle = UnpackTriangle<Complex>;
 inline constexpr auto& CxMakeSpecialMatrix = MakeSpecialMatrix<Complex>;
 inline constexpr auto& CxSvdCore = SvdCore<Complex>;
 inline constexpr auto& CxSvdValuesCore = SvdValuesCore<Complex>;
+inline constexpr auto& CxNormCore = NormCore<Complex>;
 
 inline constexpr int32_t (&CxLUFactor)(Complex*, int32_t, int32_t*, int32_t*) = LUFactor;
 inline constexpr int32_t (&CxCholeskyPacked)(Complex*, int32_t) = CholeskyPacked;
