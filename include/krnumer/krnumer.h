@@ -15,6 +15,7 @@
 #include <krnumer/linear_fit.h>
 #include <krnumer/measure.h>
 #include <krnumer/noise.h>
+#include <krnumer/nonlinear_fit.h>
 #include <krnumer/peak.h>
 #include <krnumer/polynomial.h>
 #include <krnumer/sigop.h>
