@@ -18,6 +18,7 @@
 #include <krnumer/nonlinear_fit.h>
 #include <krnumer/peak.h>
 #include <krnumer/polynomial.h>
+#include <krnumer/robust_fit.h>
 #include <krnumer/sigop.h>
 #include <krnumer/special.h>
 #include <krnumer/spectrum.h>

@@ -45,7 +45,7 @@ class FitCall {
                 data.w = weights.data();
             }
             const double* const init = init_ && init_->size() >= kCoefficients ? init_->data() : nullptr;
-            double coef[kCoefficients];
+            double coef[kCoefficients] = {};
             const int32_t status =
                 core(data, init, coef, wants_fit_ ? y_.data() : nullptr, wants_fit_ ? residue_.data() : nullptr);
             if (status < 0) return status;
