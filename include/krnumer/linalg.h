@@ -16,6 +16,7 @@
 #include <krnumer/linalg_eigen.h>
 #include <krnumer/linalg_factor.h>
 #include <krnumer/linalg_measures.h>
+#include <krnumer/linalg_schur.h>
 #include <krnumer/linalg_svd.h>
 
 #endif
