@@ -10,20 +10,12 @@
 #include "linalg/eigen_general.h"
 #include "linalg/finite.h"
 #include "linalg/real_schur.h"
+#include "linalg/row_sums.h"
 #include "linalg/triangular_vectors.h"
 
 namespace krnumer {
 
 namespace {
-
-// Dot products of consecutive rows with x, each in the order of its terms.
-template <int rows>
-void RowDots(const double* block, std::ptrdiff_t row_stride, std::ptrdiff_t columns, const double* x, double* dots) {
-    double sums[rows] = {};
-    for (std::ptrdiff_t k = 0; k < columns; ++k)
-        for (int r = 0; r < rows; ++r) sums[r] += block[r * row_stride + k] * x[k];
-    for (int r = 0; r < rows; ++r) dots[r] = sums[r];
-}
 
 // The largest magnitude in column m - 1 from row m to `high`, the first of equals; m where all are zero.
 std::ptrdiff_t FindPivot(const double* a, std::ptrdiff_t n, std::ptrdiff_t m, std::ptrdiff_t high) {
@@ -55,21 +47,8 @@ void Eliminate(double* a, std::ptrdiff_t n, const Balance& balance, int32_t* exc
             for (std::ptrdiff_t j = m; j < n; ++j) row[j] -= factor * source[j];
         }
         // The inverse from the right: column m takes the sums of the columns behind it.
-        const std::ptrdiff_t behind = balance.high - m;
-        constexpr std::ptrdiff_t kTogether = 8;
-        double sums[kTogether];
-        std::ptrdiff_t i = 0;
-        const auto add = [&](std::ptrdiff_t rows) {
-            for (std::ptrdiff_t r = 0; r < rows; ++r) a[(i + r) * n + m] += sums[r];
-        };
-        for (; i + kTogether <= balance.high + 1; i += kTogether) {
-            RowDots<kTogether>(a + i * n + m + 1, n, behind, multipliers + m + 1, sums);
-            add(kTogether);
-        }
-        for (; i <= balance.high; ++i) {
-            RowDots<1>(a + i * n + m + 1, n, behind, multipliers + m + 1, sums);
-            add(1);
-        }
+        ForEachRowSum(a + m + 1, n, balance.high + 1, balance.high - m, multipliers + m + 1,
+                      [=](std::ptrdiff_t i, double sum) { a[i * n + m] += sum; });
     }
 }
 

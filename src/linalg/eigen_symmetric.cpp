@@ -12,6 +12,7 @@
 #include "linalg/finite.h"
 #include "linalg/householder.h"
 #include "linalg/rotations.h"
+#include "linalg/row_sums.h"
 #include "linalg/transpose.h"
 #include "linalg/tridiagonal.h"
 #include "linalg/workspace.h"
@@ -35,19 +36,11 @@ struct Tridiagonal {
     T* Row(std::ptrdiff_t i) const { return a + i * n; }
 };
 
-// Products of `rows` rows, from row j of the lower triangle on, with u. All of them reach `columns` columns.
-template <int rows, class T>
-void LowerRowSums(const T* block, std::ptrdiff_t columns, std::ptrdiff_t row_stride, const T* u, T* sums) {
-    for (int r = 0; r < rows; ++r) sums[r] = T{};
-    for (std::ptrdiff_t k = 0; k < columns; ++k)
-        for (int r = 0; r < rows; ++r) sums[r] += block[r * row_stride + k] * u[k];
-}
-
 // p = A u for the Hermitian matrix of which the lower triangle is given. Each element is summed in the order of the
 // columns: those up to the diagonal from its own row, the others as the rows below come by.
 template <class T>
 void MultiplyLower(const T* a, std::ptrdiff_t size, std::ptrdiff_t row_stride, const T* u, T* p) {
-    constexpr std::ptrdiff_t kGroup = 4;
+    constexpr int kGroup = 4;
     T sums[kGroup];
     std::ptrdiff_t j = 0;
     const auto finish = [&](std::ptrdiff_t rows) {
@@ -61,11 +54,11 @@ void MultiplyLower(const T* a, std::ptrdiff_t size, std::ptrdiff_t row_stride, c
         }
     };
     for (; j + kGroup <= size; j += kGroup) {
-        LowerRowSums<kGroup>(a + j * row_stride, j, row_stride, u, sums);
+        RowSums<kGroup>(a + j * row_stride, row_stride, j, u, sums);
         finish(kGroup);
     }
     for (; j < size; ++j) {
-        LowerRowSums<1>(a + j * row_stride, j, row_stride, u, sums);
+        RowSums<1>(a + j * row_stride, row_stride, j, u, sums);
         finish(1);
     }
 }

@@ -6,18 +6,10 @@
 #include "frame/status.h"
 #include "linalg/element.h"
 #include "linalg/lapack.h"
+#include "linalg/row_sums.h"
 
 namespace krnumer {
 namespace {
-
-// Products of rows with x. The sums of several rows run side by side, since none has to wait for another.
-template <size_t kRows, class T>
-void RowSums(const T* a, size_t n, const T* x, T* y) {
-    T sums[kRows]{};
-    for (size_t j = 0; j < n; ++j)
-        for (size_t row = 0; row < kRows; ++row) sums[row] += a[row * n + j] * x[j];
-    std::copy_n(sums, kRows, y);
-}
 
 // A row of products with one factor.
 template <class T>
@@ -43,18 +35,14 @@ int32_t MatMulCore(const T* a, const T* b, int32_t m, int32_t k, int32_t n, T* c
 template <class T>
 int32_t MatVecCore(const T* a, int32_t m, int32_t n, const T* x, T* y) {
     if (m < 0 || n < 0) return kEmptyInput;
-    constexpr size_t kTogether = 4;
-    const size_t rows = Count(m), columns = Count(n);
-    size_t i = 0;
-    for (; i + kTogether <= rows; i += kTogether) RowSums<kTogether>(a + i * columns, columns, x, y + i);
-    for (; i < rows; ++i) RowSums<1>(a + i * columns, columns, x, y + i);
+    ForEachRowSum(a, n, m, n, x, [y](std::ptrdiff_t i, T sum) { y[i] = sum; });
     return kOk;
 }
 
 template <class T>
 int32_t DotCore(const T* x, const T* y, int32_t n, T* out) {
     if (n < 1) return kEmptyInput;
-    RowSums<1>(x, Count(n), y, out);
+    RowSums<1>(x, 0, n, y, out);
     return kOk;
 }
 
