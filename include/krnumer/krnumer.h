@@ -8,6 +8,7 @@
 #include <krnumer/distributions.h>
 #include <krnumer/fft.h>
 #include <krnumer/filter.h>
+#include <krnumer/fit_bounds.h>
 #include <krnumer/gen.h>
 #include <krnumer/integration.h>
 #include <krnumer/interpolation.h>

@@ -18,6 +18,10 @@ struct FitData {
     int32_t n;
 };
 
+inline double WeightOf(const FitData& data, int32_t i) {
+    return data.w != nullptr ? std::fabs(data.w[i]) : 1.0;
+}
+
 // slope x + intercept
 struct LineModel {
     static constexpr int32_t kCoefficients = 2;

@@ -8,13 +8,13 @@
 #include <limits>
 #include <type_traits>
 
+#include "fit/information.h"
 #include "fit/line.h"
 #include "fit/nonlinear.h"
 #include "fit/residual.h"
 #include "frame/numeric.h"
 #include "frame/scratch.h"
 #include "frame/status.h"
-#include "linalg/svd_solve.h"
 #include "stat/moments.h"
 #include "stat/order.h"
 
@@ -101,33 +101,6 @@ inline constexpr int32_t kCoefficientsOf = decltype(Fitter::model)::kCoefficient
 inline void LineThroughBoth(const FitData& data, double* coef) {
     coef[0] = (data.y[1] - data.y[0]) / (data.x[1] - data.x[0]);
     coef[1] = data.y[0] - coef[0] * data.x[0];
-}
-
-inline double WeightOf(const FitData& data, int32_t i) {
-    return data.w != nullptr ? std::fabs(data.w[i]) : 1.0;
-}
-
-// (J' |W| J)^-1, k by k, with the derivatives J of the model at the points.
-template <class Model>
-int32_t InverseInformation(const Model& model, const FitData& data, const double* coef, double* inverse) {
-    constexpr int32_t k = Model::kCoefficients;
-    double information[k * k] = {};
-    for (int32_t i = 0; i < data.n; ++i) {
-        double row[k];
-        model.Gradient(coef, data.x[i], row);
-        for (int32_t a = 0; a < k; ++a)
-            for (int32_t b = 0; b < k; ++b) information[a * k + b] += WeightOf(data, i) * row[a] * row[b];
-    }
-    return PseudoInverseCore(information, k, k, -1.0, inverse);
-}
-
-// g' A g
-template <int32_t k>
-double QuadraticForm(const double* g, const double* a) {
-    double sum = 0.0;
-    for (int32_t i = 0; i < k; ++i)
-        for (int32_t j = 0; j < k; ++j) sum += g[i] * a[i * k + j] * g[j];
-    return sum;
 }
 
 // ---- Bisquare weights ----
