@@ -1,6 +1,7 @@
 // Filters at work: samples per second over long signals. filter_scipy.py runs this program and sets SciPy beside it.
 #include <benchmark/benchmark.h>
 
+#include <algorithm>
 #include <cmath>
 #include <random>
 #include <vector>
@@ -8,6 +9,8 @@
 #include "filter/cascade.h"
 #include "filter/direct_form.h"
 #include "filter/iir_design.h"
+#include "filter/median_filter.h"
+#include "filter/savitzky_golay.h"
 #include "frame/numeric.h"
 
 #if defined(KRNUMER_HAVE_LIQUID)
@@ -127,6 +130,32 @@ void FilterDirectly(benchmark::State& state) {
 BENCHMARK(FilterDirectly<double, double>)->Name("DirectForm")->Args({64, 1})->Args({64, 0})->Args({3, 1});
 BENCHMARK(FilterDirectly<Complex, double>)->Name("DirectFormOfComplexSignal")->Args({64, 1});
 BENCHMARK(FilterDirectly<Complex, Complex>)->Name("DirectFormInComplex")->Args({64, 1});
+
+void FilterByMedian(benchmark::State& state) {
+    const int32_t rank = static_cast<int32_t>(state.range(0)) / 2;
+    constexpr int32_t kFewer = 100000;
+    std::vector<double> x(Count(kFewer));
+    for (auto _ : state) {
+        std::copy_n(Noise().begin(), kFewer, x.begin());
+        MedianFilter(x.data(), kFewer, rank, rank);
+        benchmark::DoNotOptimize(x.data());
+        benchmark::ClobberMemory();
+    }
+    CountSamples(state, kFewer);
+}
+BENCHMARK(FilterByMedian)->Name("Median")->Arg(5)->Arg(51)->Arg(501)->Arg(5001);
+
+void SmoothByPolynomials(benchmark::State& state) {
+    const int32_t frame = static_cast<int32_t>(state.range(0));
+    std::vector<double> y(Count(kSamples));
+    for (auto _ : state) {
+        SavitzkyGolayFilter(Noise().data(), kSamples, 3, frame, nullptr, y.data());
+        benchmark::DoNotOptimize(y.data());
+        benchmark::ClobberMemory();
+    }
+    CountSamples(state, kSamples);
+}
+BENCHMARK(SmoothByPolynomials)->Name("SavitzkyGolay")->Arg(11)->Arg(101);
 
 }  // namespace
 }  // namespace krnumer

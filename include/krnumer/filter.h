@@ -27,8 +27,8 @@ typedef struct KrFirBand {
 
 /** A narrowband filter: a prototype with its taps apart, and an interpolator. */
 typedef struct KrNarrowbandFilter {
-    int32_t type;          /**< 0 lowpass, 1 highpass, 2 bandpass, 3 bandstop, 4 and 5 lowpass and highpass as complements */
-    int32_t factor;        /**< distance of the prototype's taps; with 1 there is no interpolator */
+    int32_t type;   /**< 0 lowpass, 1 highpass, 2 bandpass, 3 bandstop, 4 and 5 lowpass and highpass as complements */
+    int32_t factor; /**< distance of the prototype's taps; with 1 there is no interpolator */
     KrHandle prototype;    /**< 1-D double */
     KrHandle interpolator; /**< 1-D double */
 } KrNarrowbandFilter;
@@ -289,5 +289,89 @@ KRNUMER_API int32_t FIRnarrowFilter_head(KrHandle x, const KrNarrowbandFilter* f
 
 /** FIRnarrowFilter_head for a complex signal, its parts filtered each for itself. `x` and `y` are 1-D complex. */
 KRNUMER_API int32_t CxSigFIRnarrowFilter_head(KrHandle x, const KrNarrowbandFilter* filter, KrHandle y, int32_t* err);
+
+/* ---- Smoothing, medians, zero phase ----------------------------------------------------------------------------- */
+
+/**
+ * Sliding median: every sample becomes the median of the window from `rank` samples before it to `rank` samples behind
+ * it. The signal counts as 0 outside. NaN sorts below all numbers.
+ *
+ * @param[in,out] x     1-D double, n samples; empty on failure
+ * @param[in]     rank  samples on each side; 0 leaves the signal as it is
+ * @param[out]    err   status, by the first that applies: 0; -20032 `rank` negative; -20008 n not above `rank` (an
+ * empty signal passes); -20001 out of memory
+ * @return              0
+ */
+KRNUMER_API int32_t MedianFilterCIN(KrHandle x, const int32_t* rank, int32_t* err);
+
+/**
+ * Sliding median of a window with two sides. Where it holds an even number of samples, its median is the mean of the
+ * two in the middle.
+ *
+ * @param[in,out] x      1-D double, n samples; empty on failure
+ * @param[in]     left   samples before the middle; may exceed n
+ * @param[in]     right  samples behind the middle; negative: as many as before it
+ * @return               0, or the first that applies: -20032 `left` negative; -20008 n not above `right` (an empty
+ * signal passes); -20001 out of memory
+ */
+KRNUMER_API int32_t MedianFilter81_H(KrHandle x, int32_t left, int32_t right);
+
+/**
+ * Matrices that fit polynomials to frames of samples (A. Savitzky, M. J. E. Golay, Anal. Chem. 36, 1627, 1964). With V
+ * the powers t^k of t = -(frame - 1)/2 ... (frame - 1)/2 and W the weights' magnitudes on the diagonal,
+ *
+ *     differentiators  D = (V^T W V)^-1 V^T W,   smoothing  S = V D.
+ *
+ * Row k of D, applied to a frame, gives the coefficient of t^k of the best polynomial: the derivative in the middle, in
+ * units of samples, without the factor k!. Row i of S gives the value of the polynomial at sample i.
+ *
+ * @param[in]  order                of the polynomial
+ * @param[in]  frame                samples in a frame, odd
+ * @param[in]  weights              1-D double, `frame` weights of the squared deviations, or empty for equal ones
+ * @param[in]  wantDifferentiators  0 leaves `differentiators` as it came
+ * @param[out] smoothing            2-D double, `frame` by `frame`
+ * @param[out] differentiators      2-D double, order + 1 rows of `frame` columns
+ * @return                          0, or the first that applies: -20063 `order` below 1; -20037 `frame` not above
+ * `order`; -20002 another number of weights; -20001 out of memory; -20033 `frame` even; -20068 a weight that is not
+ * finite; -20071 weights that leave the polynomial undetermined. Both matrices are empty on failure.
+ */
+KRNUMER_API int32_t SavitzkyGolayCoefH(int32_t order, int32_t frame, KrHandle weights, int32_t wantDifferentiators,
+                                       KrHandle smoothing, KrHandle differentiators);
+
+/**
+ * Smooths by polynomials: every sample becomes the value there of the polynomial that fits the frame around it best,
+ * the first and last ones that of the first or last full frame. Polynomials up to `order` stay as they are, to the
+ * ends.
+ *
+ * @param[in]  x        1-D double, n samples
+ * @param[in]  order    of the polynomials
+ * @param[in]  frame    samples in a frame, odd
+ * @param[in]  weights  1-D double, `frame` weights of the squared deviations, or empty for equal ones
+ * @param[out] y        1-D double, n samples; empty on failure
+ * @return              0, or the first that applies: -20063 `order` below 1; -20037 `frame` not above `order`; -20002
+ *                      another number of weights; -20001 out of memory; -20008 n below `frame`; then as
+ *                      SavitzkyGolayCoefH
+ */
+KRNUMER_API int32_t SavitzkyGolayFiltH(KrHandle x, int32_t order, int32_t frame, KrHandle weights, KrHandle y);
+
+/**
+ * Filters forward and backward in direct form (see IIR_Filter), which squares the magnitude of the response and cancels
+ * its phase. On both sides the signal is continued by as many zeros as the longer coefficient array has elements; what
+ * has not died out there is lost. Without both coefficient arrays nothing is done.
+ *
+ * @param[in,out] x              1-D double: the signal, replaced by the filtered one; stays on failure
+ * @param[in]     a              1-D double, na feedback coefficients, or empty
+ * @param[in]     b              1-D double, nb feedforward coefficients
+ * @param[in,out] forwardState1  1-D double, nb - 1 elements: state of the forward pass
+ * @param[in,out] forwardState2  1-D double, nb - 1 elements: state of the backward pass
+ * @param[in,out] reverseState1  1-D double, na - 1 elements: state of the forward pass
+ * @param[in,out] reverseState2  1-D double, na - 1 elements: state of the backward pass
+ * @param[in]     keepState      0 clears the states first. A state of another length is resized and cleared in any
+ * case. Reverse states are not looked at when `a` is empty.
+ * @return                       0; -20003 `x` empty (nothing is touched); -20008 `a` without `b`, -20001 out of memory
+ *                               (both leave the four states empty)
+ */
+KRNUMER_API int32_t zeroPhaseFiltH(KrHandle x, KrHandle a, KrHandle b, KrHandle forwardState1, KrHandle forwardState2,
+                                   KrHandle reverseState1, KrHandle reverseState2, int32_t keepState);
 
 #endif

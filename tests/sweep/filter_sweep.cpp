@@ -120,3 +120,33 @@ SWEEP(CxSigFIRnarrowFilter_head) {
     const KrNarrowbandFilter filter{kComplement, 2, scene.Doubles({1, 2, 1}), scene.Doubles({1, 1})};
     return scene.Call([&] { return CxSigFIRnarrowFilter_head(x, &filter, y, scene.err()); });
 }
+
+SWEEP(MedianFilterCIN) {
+    const int32_t rank = 1;
+    const KrHandle x = scene.Replaced(scene.Doubles({3, 1, 4, 1, 5}));
+    return scene.Call([&] { return MedianFilterCIN(x, &rank, scene.err()); });
+}
+
+SWEEP(MedianFilter81_H) {
+    const KrHandle x = scene.Replaced(scene.Doubles({3, 1, 4, 1, 5}));
+    return scene.Call([&] { return MedianFilter81_H(x, 2, 1); });
+}
+
+SWEEP(SavitzkyGolayCoefH) {
+    const KrHandle weights = scene.Doubles({1, 2, 3, 2, 1}), smoothing = scene.OutMatrix(),
+                   differentiators = scene.OutMatrix();
+    return scene.Call([&] { return SavitzkyGolayCoefH(2, 5, weights, 1, smoothing, differentiators); });
+}
+
+SWEEP(SavitzkyGolayFiltH) {
+    const KrHandle x = scene.Doubles({3, 1, 4, 1, 5, 9}), weights = scene.Doubles({}), y = scene.OutDoubles();
+    return scene.Call([&] { return SavitzkyGolayFiltH(x, 2, 5, weights, y); });
+}
+
+SWEEP(zeroPhaseFiltH) {
+    const KrHandle x = scene.Replaced(scene.Doubles({3, 1, 4}), sweep::OnFailure::kOther), a = scene.Doubles({1, -0.5}),
+                   b = scene.Doubles({1, 2, 1}), forward1 = scene.Replaced(scene.Doubles({})),
+                   forward2 = scene.Replaced(scene.Doubles({})), reverse1 = scene.Replaced(scene.Doubles({})),
+                   reverse2 = scene.Replaced(scene.Doubles({}));
+    return scene.Call([&] { return zeroPhaseFiltH(x, a, b, forward1, forward2, reverse1, reverse2, 0); });
+}
