@@ -15,8 +15,10 @@
 #include <krnumer/linalg_basic.h>
 #include <krnumer/linalg_eigen.h>
 #include <krnumer/linalg_factor.h>
+#include <krnumer/linalg_inverse.h>
 #include <krnumer/linalg_measures.h>
 #include <krnumer/linalg_schur.h>
+#include <krnumer/linalg_solve.h>
 #include <krnumer/linalg_svd.h>
 
 #endif

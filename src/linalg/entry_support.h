@@ -34,6 +34,15 @@ int32_t CheckSquare(const ShapedView<T, 2>& matrix) {
     return IsEmpty(matrix) ? kEmptyInput : kOk;
 }
 
+// The same for the matrix of a system of equations with a matrix of right-hand sides, where the first fault ends the
+// checks: sizes, square shape, and -20002 for right-hand sides of another length.
+template <class A, class B>
+int32_t CheckSquareSystem(const A& matrix, const B& right_sides) {
+    if (IsEmpty(matrix) || right_sides.columns() < 1) return kEmptyInput;
+    if (!IsSquare(matrix)) return kNotSquare;
+    return right_sides.rows() == matrix.rows() ? kOk : kSizesDiffer;
+}
+
 // Makes complex elements of the doubles that a core left in the first half of their array.
 inline void SpreadToComplex(Complex* elements, int32_t count) {
     const double* values = reinterpret_cast<const double*>(elements);

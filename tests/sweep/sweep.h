@@ -85,6 +85,9 @@ class Scene {
     // The status of a call whose memory is refused, where it is not -20001.
     void RefusalGives(int32_t status) { refusal_status_ = status; }
 
+    // The call fails even undisturbed, by this status: what it stands for is not provided.
+    void AlwaysGives(int32_t status) { undisturbed_status_ = status; }
+
     // A refused resize is no failure of the call, which does without.
     void SurvivesRefusedResize() { survives_resize_ = true; }
 
@@ -105,6 +108,7 @@ class Scene {
     int32_t result() const { return result_; }
     bool survives_refusal() const { return survives_refusal_; }
     bool survives_resize() const { return survives_resize_; }
+    int32_t undisturbed_status() const { return undisturbed_status_; }
     int32_t refusal_status() const { return refusal_status_; }
 
     // The outputs, printable and comparable to the bit.
@@ -135,6 +139,7 @@ class Scene {
     bool err_asked_ = false;
     bool survives_refusal_ = false;
     bool survives_resize_ = false;
+    int32_t undisturbed_status_ = krnumer::kOk;  // or a warning
     int32_t refusal_status_ = krnumer::kOutOfMemory;
     int32_t refused_allocation_;
     int32_t result_ = 0;
