@@ -156,6 +156,183 @@ KRNUMER_API int32_t Correlation_2DH(KrHandle x, KrHandle y, KrHandle z, int32_t 
 /** Correlation_2DH of complex planes; `x` is conjugated too. */
 KRNUMER_API int32_t CxCorrelation_2DH(KrHandle x, KrHandle y, KrHandle z, int32_t algorithm);
 
+/* ---- Changes of the sampling rate. Streams keep what they need between blocks in arguments of the caller's, so that
+ *      the blocks of a signal, however cut, give what the whole would give. -----------------------------------------
+ */
+
+/**
+ * Decimation of a block: every factor-th sample, or the means of blocks of `factor` samples. What is left at the end is
+ * dropped.
+ *
+ * @param[in,out] x          n samples; n / factor afterwards, rounded down
+ * @param[in]     factor     1 to n
+ * @param[in]     averaging  0 to keep samples, else means
+ * @param[out]    err        status: 0; -20003 when `x` is empty; -20022 when `factor` is below 1 or above n; -20001
+ *                           without memory
+ * @return                   0
+ */
+KRNUMER_API int32_t DecimateCIN(KrHandle x, const int32_t* factor, const uint8_t* averaging, int32_t* err);
+
+/** DecimateCIN of complex samples; the status is the result. */
+KRNUMER_API int32_t CxDecimate_H(KrHandle x, int32_t factor, int32_t averaging);
+
+/**
+ * Decimation of a stream, block by block. What is left of a block is kept for the next.
+ *
+ * @param[in,out] x             samples, of any number; the output afterwards, which may be empty
+ * @param[in]     factor        from 1 on
+ * @param[in]     averaging     0 to keep every factor-th sample, else means of `factor` samples
+ * @param[in,out] start         samples to pass over until the next sample that is kept, or until the next mean begins
+ * or is complete; 0 to begin with
+ * @param[in]     reset         other than 0 forgets `partialCount` and `partialSum`, not `start`
+ * @param[in,out] partialCount  samples in a mean that is not complete
+ * @param[in,out] partialSum    their sum
+ * @return                      0; -20140 when `factor` is below 1; -20059 when `start` is negative; -20001 without
+ *                              memory. The stream stays as it was when a check fails.
+ */
+KRNUMER_API int32_t DecimateContinuous_H(KrHandle x, int32_t factor, int32_t averaging, int32_t* start, int32_t reset,
+                                         int32_t* partialCount, double* partialSum);
+
+/** DecimateContinuous_H of complex samples. */
+KRNUMER_API int32_t CxDecimateContinuous_H(KrHandle x, int32_t factor, int32_t averaging, int32_t* start, int32_t reset,
+                                           int32_t* partialCount, KrComplex* partialSum);
+
+/**
+ * Resamples a stream by L / M with an FIR filter at the rate of L samples per sample: y[k] = L * sum of
+ * filter[i L - k M + (taps - 1) / 2] x[i] from a start of 0 (R. E. Crochiere and L. R. Rabiner, Multirate Digital
+ * Signal Processing, chapter 3). The delay of the filter is taken off, and samples before the first count as 0.
+ *
+ * Filters of less than 2 L - 1 taps give the outputs of a block, but can leave a negative `start`, which the next call
+ * refuses.
+ *
+ * @param[in]     x             the block's samples, of any number
+ * @param[in]     L             factor of the rate, from 1 on
+ * @param[in]     M             divisor of the rate, from 1 on
+ * @param[in]     reset         other than 0 begins a stream: sizes `history` and forgets what it held, not `start`
+ * @param[in,out] start         position of the next output in units of 1 / L samples, counted from the first sample
+ *                              kept; 0 to begin with
+ * @param[in]     filter        1-D double, an odd number of taps, whose sum is the gain at frequency 0; taken
+ *                              forwards, so that one without symmetry correlates
+ * @param[in,out] history       the samples kept, as those of `x`; (taps - 1) / L + 1 elements
+ * @param[in,out] historyCount  how many of them there are
+ * @param[out]    y             the outputs that the samples allow, which may be none
+ * @return                      0; -20059 when `start` or `historyCount` is negative; -20140 when `L` or `M` is below 1;
+ *                              -20033 when the number of taps is even; -20046 when `history` is too short; -20001
+ *                              without memory. A failure empties `history` and `y`; `start` stays as it was.
+ */
+KRNUMER_API int32_t RationalResample_H(KrHandle x, int32_t L, int32_t M, int32_t reset, int32_t* start, KrHandle filter,
+                                       KrHandle history, int32_t* historyCount, KrHandle y);
+
+/** RationalResample_H of complex samples; the filter is real. */
+KRNUMER_API int32_t CxRationalResample_H(KrHandle x, int32_t L, int32_t M, int32_t reset, int32_t* start,
+                                         KrHandle filter, KrHandle history, int32_t* historyCount, KrHandle y);
+
+/**
+ * RationalResample_H of several channels at one position: `x`, `history` and `y` are 2-D with a row per channel.
+ *
+ * A `history` without rows is sized as by `reset`. One of another number of rows than `x`, neither 0, gives -20008.
+ */
+KRNUMER_API int32_t RationalResampleMultiCh_H(KrHandle x, int32_t L, int32_t M, int32_t reset, int32_t* start,
+                                              KrHandle filter, KrHandle history, int32_t* historyCount, KrHandle y);
+
+/** RationalResampleMultiCh_H of complex channels; the filter is real. */
+KRNUMER_API int32_t CxRationalResampleMCh_H(KrHandle x, int32_t L, int32_t M, int32_t reset, int32_t* start,
+                                            KrHandle filter, KrHandle history, int32_t* historyCount, KrHandle y);
+
+#pragma pack(push, 1)
+
+/** How Resample_Const resamples. */
+typedef struct KrResampleSpec {
+    double ratio;         /**< input samples per output sample, above 0 */
+    int32_t mode;         /**< 1 reads the kernel at the nearest point of its table, any other interpolates linearly */
+    double start;         /**< position of the first output in input samples */
+    KrHandle kernel;      /**< 1-D double: the interpolation kernel, symmetric around its middle */
+    int32_t oversampling; /**< points of the kernel per input sample, from 1 on */
+} KrResampleSpec;
+
+/** How Resample_Variable resamples. */
+typedef struct KrVariableResampleSpec {
+    int32_t mode;         /**< as in KrResampleSpec */
+    uint8_t adaptive;     /**< other than 0 stretches the kernel by the step to each output where that is above 1 */
+    KrHandle kernel;      /**< as in KrResampleSpec */
+    int32_t oversampling; /**< as in KrResampleSpec */
+} KrVariableResampleSpec;
+
+/** A stream of Resample_Const between two blocks. All but the handles is set by the initialising call. */
+typedef struct KrResampleState {
+    KrHandle history;     /**< 1-D, as the samples: those kept */
+    int32_t historyCount; /**< how many of them there are */
+    KrHandle taps;        /**< 1-D double: work area */
+    double gain;          /**< factor of the outputs */
+    int32_t left;         /**< samples under the kernel up to the position of an output */
+    int32_t right;        /**< and behind it */
+    int32_t mode;         /**< from the specification */
+    double ratio;         /**< from the specification */
+    double frac;          /**< the next output stands at index + frac, */
+    int32_t index;        /**< counted from the first sample kept */
+} KrResampleState;
+
+#pragma pack(pop)
+
+/**
+ * Resamples a stream at a constant ratio that need not be rational: y(t) = delta * sum of x[i] k(h + (i - t) delta),
+ * with a kernel k of K points in a table, h = (K - 1) / 2 and delta = oversampling, divided by the ratio where that is
+ * above 1, so that the kernel also limits the band (J. O. Smith and P. Gossett, ICASSP 1984). Samples before the first
+ * count as 0.
+ *
+ * @param[in]     x            the block's samples, of any number
+ * @param[in,out] state        the stream
+ * @param[in]     spec         ratio, mode and start count when a stream begins, kernel and oversampling in every call
+ * @param[in]     initialize   other than 0 begins a stream
+ * @param[out]    y            room for the outputs, rounded up: behind the first `outCount` elements all are 0
+ * @param[out]    outCount     number of outputs; 0 on failure
+ * @param[in]     scaleKernel  0 keeps the kernel from being stretched
+ * @return                     0; -20140 when the ratio is not above 0 or the oversampling is below 1; -20003 when the
+ *                             kernel is empty; -20061 when a position does not fit 32 bits; -20059 when the state's
+ *                             count is negative; -20046, -20075 when the state's `history` or `taps` is too short;
+ *                             -20076 when `y` has no room; -20001 without memory. A failure leaves the state as it was,
+ *                             but for sizes and elements of its arrays.
+ */
+KRNUMER_API int32_t Resample_Const(KrHandle x, KrResampleState* state, const KrResampleSpec* spec, int32_t initialize,
+                                   KrHandle y, int32_t* outCount, int32_t scaleKernel);
+
+/** Resample_Const of complex samples; history and outputs are complex, the kernel is real. */
+KRNUMER_API int32_t CxResample_Const(KrHandle x, KrResampleState* state, const KrResampleSpec* spec, int32_t initialize,
+                                     KrHandle y, int32_t* outCount, int32_t scaleKernel);
+
+/**
+ * Resamples at given positions, as Resample_Const does at equal steps. Positions count samples from the start of the
+ * block; those that the block does not reach are left for the next, which begins with the samples not consumed.
+ *
+ * @param[in]     x         the block's samples: those not consumed and new ones
+ * @param[in,out] times     positions, 1-D double; afterwards the first `outCount` are outputs, and the others are
+ *                          counted from the next block
+ * @param[in]     spec      how
+ * @param[in,out] lastTime  the position before the first of `times`, in the same count; afterwards that of the last
+ *                          output, counted from the next block
+ * @param[out]    outCount  number of outputs; 0 on failure
+ * @param[out]    consumed  samples that the caller takes off the front of `x` for the next call; 0 on failure
+ * @return                  0, always without `times`; -20140 when the oversampling is below 1; -20003 when the kernel
+ * is empty; -20061 when a position does not fit 32 bits; -20001 without memory. A failure empties `times`.
+ */
+KRNUMER_API int32_t Resample_Variable(KrHandle x, KrHandle times, const KrVariableResampleSpec* spec, double* lastTime,
+                                      int32_t* outCount, int32_t* consumed);
+
+/**
+ * Resample_Variable of complex samples, whose outputs go to an array of their own.
+ *
+ * @param[in]     x         the block's samples: those not consumed and new ones
+ * @param[in,out] times     positions; those that were reached stay, the others are counted from the next block
+ * @param[in]     spec      how
+ * @param[out]    y         as many elements as there are `times`: outputs, and 0 behind the first `outCount`
+ * @param[in,out] lastTime  as in Resample_Variable
+ * @param[out]    outCount  number of outputs; 0 on failure
+ * @param[out]    consumed  as in Resample_Variable
+ * @return                  as of Resample_Variable. A failure empties `times` and `y`.
+ */
+KRNUMER_API int32_t CxResample_Variable(KrHandle x, KrHandle times, const KrVariableResampleSpec* spec, KrHandle y,
+                                        double* lastTime, int32_t* outCount, int32_t* consumed);
+
 /* ---- Samples in the time domain ----------------------------------------------------------------------------------
  */
 

@@ -84,6 +84,7 @@ class ExactSum {
         re_ += static_cast<long double>(a.re) * b.re - static_cast<long double>(a.im) * b.im;
         im_ += static_cast<long double>(a.re) * b.im + static_cast<long double>(a.im) * b.re;
     }
+    void Add(double a, Complex b) { Add(Complex{a, 0.0}, b); }
     T value() const {
         if constexpr (std::is_same_v<T, Complex>) {
             return {static_cast<double>(re_), static_cast<double>(im_)};

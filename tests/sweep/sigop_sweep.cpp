@@ -167,3 +167,99 @@ SWEEP(PhasMod) {
     double* state = scene.Numbers(6, sweep::OnFailure::kOther);
     return scene.Call([&] { return PhasMod(3, 1.0, state, 0.1, state + 1, state + 4, state + 5); });
 }
+
+SWEEP(DecimateCIN) {
+    const KrHandle x = scene.Replaced(scene.Doubles(kReal));
+    const int32_t factor = 2;
+    const uint8_t averaging = 1;
+    return scene.Call([&] { return DecimateCIN(x, &factor, &averaging, scene.err()); });
+}
+SWEEP(CxDecimate_H) {
+    const KrHandle x = scene.Replaced(scene.Complexes(kComplex));
+    return scene.Call([&] { return CxDecimate_H(x, 2, 0); });
+}
+SWEEP(DecimateContinuous_H) {
+    const KrHandle x = scene.Replaced(scene.Doubles(kReal));
+    int32_t* start = scene.Integer(0);
+    int32_t* count = scene.Integer(0);
+    double* sum = scene.State(0);
+    return scene.Call([&] { return DecimateContinuous_H(x, 3, 1, start, 1, count, sum); });
+}
+SWEEP(CxDecimateContinuous_H) {
+    const KrHandle x = scene.Replaced(scene.Complexes(kComplex));
+    int32_t* start = scene.Integer(1);
+    int32_t* count = scene.Integer(0);
+    auto* sum = scene.ComplexNumber(sweep::OnFailure::kOther);
+    return scene.Call([&] { return CxDecimateContinuous_H(x, 2, 1, start, 1, count, sum); });
+}
+
+namespace {
+
+template <class Export>
+int32_t PlayRational(Scene& scene, Export resample, KrHandle x, KrHandle history, KrHandle y) {
+    const KrHandle filter = scene.Doubles({0.1, 0.2, 0.4, 0.2, 0.1});
+    int32_t* start = scene.Integer(1);
+    int32_t* count = scene.Integer(3);
+    return scene.Call([&] { return resample(x, 3, 2, 1, start, filter, history, count, y); });
+}
+
+}  // namespace
+
+SWEEP(RationalResample_H) {
+    const KrHandle x = scene.Doubles(kReal), history = scene.OutDoubles(), y = scene.OutDoubles();
+    return PlayRational(scene, RationalResample_H, x, history, y);
+}
+SWEEP(CxRationalResample_H) {
+    const KrHandle x = scene.Complexes(kComplex), history = scene.OutComplexes(), y = scene.OutComplexes();
+    return PlayRational(scene, CxRationalResample_H, x, history, y);
+}
+SWEEP(RationalResampleMultiCh_H) {
+    const KrHandle x = scene.Matrix(2, 3, {1, 2, 3, 4, 5, 6}), history = scene.OutMatrix(), y = scene.OutMatrix();
+    return PlayRational(scene, RationalResampleMultiCh_H, x, history, y);
+}
+SWEEP(CxRationalResampleMCh_H) {
+    const KrHandle x = scene.ComplexMatrix(2, 2, {{1, 2}, {3, 4}, {5, 6}, {7, 8}});
+    const KrHandle history = scene.OutComplexMatrix(), y = scene.OutComplexMatrix();
+    return PlayRational(scene, CxRationalResampleMCh_H, x, history, y);
+}
+
+namespace {
+
+const std::vector<double> kTable{0, 0.5, 1, 0.5, 0};
+
+// The state's arrays stay with the caller, whatever happens.
+template <class Export>
+int32_t PlayConstant(Scene& scene, Export resample, KrHandle x, KrHandle history, KrHandle y) {
+    KrResampleState state{};
+    state.history = history;
+    state.taps = scene.OutDoubles(sweep::OnFailure::kOther);
+    const KrResampleSpec spec{0.75, 0, 0.5, scene.Doubles(kTable), 2};
+    int32_t* count = scene.Integer(0);
+    return scene.Call([&] { return resample(x, &state, &spec, 1, y, count, 1); });
+}
+
+}  // namespace
+
+SWEEP(Resample_Const) {
+    const KrHandle x = scene.Doubles(kReal), history = scene.OutDoubles(sweep::OnFailure::kOther);
+    return PlayConstant(scene, Resample_Const, x, history, scene.OutDoubles());
+}
+SWEEP(CxResample_Const) {
+    const KrHandle x = scene.Complexes(kComplex), history = scene.OutComplexes(sweep::OnFailure::kOther);
+    return PlayConstant(scene, CxResample_Const, x, history, scene.OutComplexes());
+}
+SWEEP(Resample_Variable) {
+    const KrHandle x = scene.Doubles(kReal), times = scene.Replaced(scene.Doubles({0.5, 1.75, 3, 9}));
+    const KrVariableResampleSpec spec{0, 1, scene.Doubles(kTable), 2};
+    double* last_time = scene.State(-0.5);
+    int32_t *count = scene.Integer(0), *consumed = scene.Integer(0);
+    return scene.Call([&] { return Resample_Variable(x, times, &spec, last_time, count, consumed); });
+}
+SWEEP(CxResample_Variable) {
+    const KrHandle x = scene.Complexes(kComplex), times = scene.Replaced(scene.Doubles({0.5, 1.75, 3, 9}));
+    const KrHandle y = scene.OutComplexes();
+    const KrVariableResampleSpec spec{1, 0, scene.Doubles(kTable), 2};
+    double* last_time = scene.State(-0.5);
+    int32_t *count = scene.Integer(0), *consumed = scene.Integer(0);
+    return scene.Call([&] { return CxResample_Variable(x, times, &spec, y, last_time, count, consumed); });
+}
