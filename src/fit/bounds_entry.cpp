@@ -2,6 +2,7 @@
 
 #include <cstring>
 
+#include "fit/weights.h"
 #include "frame/entry.h"
 #include "krnumer/fit_bounds.h"
 
@@ -16,10 +17,10 @@ struct BandInputs {
     template <class Model>
     int32_t Check() const {
         if (const int32_t status = Band<Model>::CheckCount(y.size())) return status;
-        if (x.size() != y.size() || (w.size() != 0 && w.size() != y.size())) return kSizesDiffer;
+        if (x.size() != y.size() || !WeightsFit(w, y.size())) return kSizesDiffer;
         return kOk;
     }
-    FitData data() const { return {x.data(), y.data(), w.size() > 0 ? w.data() : nullptr, y.size()}; }
+    FitData data() const { return {x.data(), y.data(), OptionalWeights(w), y.size()}; }
 
     In<double> y;
     In<double> x;
@@ -144,9 +145,9 @@ int32_t GoodnessOfFit_head(KrHandle y, KrHandle fit, KrHandle w, int32_t dof, do
     Result<double> deviation(call, rmse);
     const int32_t n = ordinates.size();
     if (n < 1) return call.Fail(kEmptyInput);
-    if (fitted.size() != n || (weights.size() != 0 && weights.size() != n)) return call.Fail(kSizesDiffer);
+    if (fitted.size() != n || !WeightsFit(weights, n)) return call.Fail(kSizesDiffer);
     return call.Run([&] {
-        return GoodnessOfFit(ordinates.data(), fitted.data(), weights.size() > 0 ? weights.data() : nullptr, n, dof,
-                             errors.data(), explained.data(), deviation.data());
+        return GoodnessOfFit(ordinates.data(), fitted.data(), OptionalWeights(weights), n, dof, errors.data(),
+                             explained.data(), deviation.data());
     });
 }

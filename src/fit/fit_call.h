@@ -1,13 +1,12 @@
 // The call that entry points of curve fits share.
 #pragma once
 
-#include <algorithm>
 #include <cstring>
 #include <optional>
 
 #include "fit/model.h"
+#include "fit/weights.h"
 #include "frame/entry.h"
-#include "frame/scratch.h"
 
 namespace krnumer {
 
@@ -34,14 +33,12 @@ class FitCall {
     template <class Core>
     int32_t Run(Core&& core) {
         const int32_t n = y_.size();
-        if (x_.size() != n || (w_ && w_->size() != 0 && w_->size() != n)) return call_.Fail(kSizesDiffer);
+        if (x_.size() != n || (w_ && !WeightsFit(*w_, n))) return call_.Fail(kSizesDiffer);
         return call_.Run([&]() -> int32_t {
-            FitData data{x_.data(), y_.data(), w_ && w_->size() > 0 ? w_->data() : nullptr, n};
+            FitData data{x_.data(), y_.data(), w_ ? OptionalWeights(*w_) : nullptr, n};
             Scratch<double> weights;
             if (deviations_ && data.w != nullptr) {
-                if (!weights.Allocate(Count(n))) return kOutOfMemory;
-                std::transform(data.w, data.w + n, weights.data(),
-                               [](double sigma) { return sigma != 0.0 ? 1.0 / (sigma * sigma) : 1.0; });
+                if (const int32_t status = WeightsOfDeviations(data.w, n, &weights)) return status;
                 data.w = weights.data();
             }
             const double* const init = init_ && init_->size() >= kCoefficients ? init_->data() : nullptr;
@@ -67,7 +64,7 @@ class FitCall {
           residue_(call_, residue != nullptr ? residue : &ignored_) {
         if (arguments.w != nullptr) w_.emplace(call_, arguments.w);
         if (arguments.init != nullptr) init_.emplace(call_, arguments.init);
-        if (keep_residue) std::memcpy(residue_.data(), residue, sizeof(double));
+        if (keep_residue && residue != nullptr) std::memcpy(residue_.data(), residue, sizeof(double));
     }
 
     ByValue call_;

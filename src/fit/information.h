@@ -21,7 +21,7 @@ int32_t InverseInformation(const Model& model, const FitData& data, const double
         model.Gradient(coef, data.x[i], row);
         const double weight = sign == WeightSign::kAsGiven && data.w != nullptr ? data.w[i] : WeightOf(data, i);
         for (int32_t a = 0; a < k; ++a)
-            for (int32_t b = 0; b < k; ++b) information[a * k + b] += weight * row[a] * row[b];
+            for (int32_t b = 0; b < k; ++b) information[a * k + b] += weight * (row[a] * row[b]);
     }
     return PseudoInverseCore(information, k, k, -1.0, inverse);
 }

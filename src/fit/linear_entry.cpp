@@ -1,24 +1,11 @@
 #include "fit/least_squares.h"
 #include "fit/line.h"
 #include "fit/polynomial.h"
+#include "fit/weights.h"
 #include "frame/entry.h"
-#include "frame/scratch.h"
 #include "krnumer/linear_fit.h"
 
 using namespace krnumer;
-
-namespace {
-
-// Optional weights: an empty array means none.
-const double* Weights(const In<double>& w) {
-    return w.size() > 0 ? w.data() : nullptr;
-}
-
-bool WeightsFit(const In<double>& w, int32_t n) {
-    return w.size() == 0 || w.size() == n;
-}
-
-}  // namespace
 
 // ---- Lines ----
 
@@ -33,8 +20,8 @@ int32_t LinFit_head(KrHandle y, KrHandle x, KrHandle w, double* slope, double* i
     const int32_t n = ordinates.size();
     if (abscissas.size() != n || !WeightsFit(weights, n)) return call.Fail(kSizesDiffer);
     return call.Run([&] {
-        return LinFitCore(abscissas.data(), ordinates.data(), n, Weights(weights), ordinates.data(), steepness.data(),
-                          offset.data(), error.data());
+        return LinFitCore(abscissas.data(), ordinates.data(), n, OptionalWeights(weights), ordinates.data(),
+                          steepness.data(), offset.data(), error.data());
     });
 }
 
@@ -61,7 +48,7 @@ int32_t LinFitCoef80_head(KrHandle y, KrHandle x, KrHandle w, double* slope, dou
     const int32_t n = ordinates.size();
     if (abscissas.size() != n || !WeightsFit(weights, n)) return call.Fail(kSizesDiffer);
     return call.Run([&] {
-        return LinFitCore(abscissas.data(), ordinates.data(), n, Weights(weights), nullptr, steepness.data(),
+        return LinFitCore(abscissas.data(), ordinates.data(), n, OptionalWeights(weights), nullptr, steepness.data(),
                           offset.data(), nullptr);
     });
 }
@@ -90,9 +77,10 @@ int32_t FitPolynomial(Call& call, const PolynomialData& data, int32_t order, int
     if (n <= int64_t{order} - fixed) return call.Fail(kUnderdetermined);
     if (fit.Resize(n) || coefficients.Resize(WrappingAdd(order, 1))) return call.Fail(kOutOfMemory);
     return call.Run([&] {
-        return PolyFitCore(data.x.data(), data.y.data(), data.w != nullptr ? Weights(*data.w) : nullptr, n, order,
-                           method, fixed > 0 ? data.powers->data() : nullptr, fixed > 0 ? data.values->data() : nullptr,
-                           fixed, fit.data(), coefficients.data(), error.data());
+        return PolyFitCore(data.x.data(), data.y.data(), data.w != nullptr ? OptionalWeights(*data.w) : nullptr, n,
+                           order, method, fixed > 0 ? data.powers->data() : nullptr,
+                           fixed > 0 ? data.values->data() : nullptr, fixed, fit.data(), coefficients.data(),
+                           error.data());
     });
 }
 
@@ -161,12 +149,10 @@ int32_t FitGeneral(KrHandle h, KrHandle y, KrHandle w, RowWeights meaning, int32
     const int32_t side = want_covariance != 0 ? k : 0;
     if (coefficients.Resize(k) || fit.Resize(m) || spread.Resize(side, side)) return call.Fail(kOutOfMemory);
     return call.Run([&]() -> int32_t {
-        const double* weights = Weights(given);
+        const double* weights = OptionalWeights(given);
         Scratch<double> from_deviations;
         if (weights != nullptr && meaning == RowWeights::kStandardDeviations) {
-            if (!from_deviations.Allocate(Count(m))) return kOutOfMemory;
-            for (size_t i = 0; i < Count(m); ++i)
-                from_deviations[i] = weights[i] != 0.0 ? 1.0 / (weights[i] * weights[i]) : 1.0;
+            if (const int32_t status = WeightsOfDeviations(weights, m, &from_deviations)) return status;
             weights = from_deviations.data();
         }
         return GenLSFitCore(observations.data(), m, k, ordinates.data(), weights, coefficients.data(), fit.data(),
