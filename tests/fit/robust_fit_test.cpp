@@ -200,6 +200,22 @@ TEST_F(RobustFits, BisquareLinesSolveTheirEquation) {
     }
 }
 
+// The curves are fitted within to a tolerance of their own, which limits how well they agree.
+TEST_F(RobustFits, BisquareFitsAreFixedPointsOfLeastSquares) {
+    for (const Model model : kModels) {
+        for (const bool weighted : {false, true}) {
+            const std::string row = NameOf(model) + (weighted ? ".weighted" : "");
+            SCOPED_TRACE(row);
+            Fit fit{Reference(NameOf(model) + ".spoiled"), Reference("x"), weighted ? Reference("w") : Values{}};
+            ASSERT_EQ(fit.Run(Way::kBisquare, model), 0);
+            const bool closed = model == Model::kLine || model == Model::kLog;
+            const Values& expected = Reference(row + ".bisquare");
+            for (size_t j = 0; j < expected.size(); ++j)
+                EXPECT_THAT(fit.coef[j], Near(expected[j], closed ? 1e-6 : 1e-3));
+        }
+    }
+}
+
 TEST_F(RobustFits, CleanDataAreFittedExactly) {
     const Values x{1, 2, 3, 4, 5, 6, 7};
     const double truth[][3] = {{2, -1}, {0.5, 0.4}, {2, 1.5}, {3, 2}, {5, 4, 1.5}};

@@ -1,7 +1,8 @@
 """Makes curves.csv: data with the fits and bands of SciPy, a row of numbers for each name.
 
 Plain fits are scipy.optimize.curve_fit with the tolerances at their least; those of least absolute residuals minimise
-the sum by Nelder and Mead's simplex from several starts, or as a linear program for the line. Bands are made from the
+the sum by Nelder and Mead's simplex from several starts, or as a linear program for the line; bisquare fits repeat
+curve_fit until nothing changes. Bands are made from the
 Jacobian at the fit in the textbook way, with the quantile of scipy.stats.t.
 """
 import csv
@@ -50,6 +51,19 @@ def jacobian(model, x, p):
     return np.array(columns).T
 
 
+def bisquare(model, x, y, p, omega):
+    for _ in range(500):
+        j = jacobian(model, x, p)
+        leverage = omega * np.einsum("ij,jk,ik->i", j, np.linalg.inv(j.T @ (omega[:, None] * j)), j)
+        r = (y - model(x, *p)) * np.sqrt(omega / (1 - leverage))
+        u = 0.6745 * r / (4.685 * np.median(np.abs(r - np.median(r))))
+        factor = omega * np.where(np.abs(u) < 1, (1 - u**2) ** 2, 0)
+        kept = factor > 0
+        p, _ = optimize.curve_fit(model, x[kept], y[kept], p, sigma=1 / np.sqrt(factor[kept]), ftol=1e-15, xtol=1e-15,
+                                  gtol=1e-15)
+    return p
+
+
 n = 14
 x = np.linspace(0.5, 7, n)
 w = np.round(rng.uniform(0.3, 3, n), 2)
@@ -82,6 +96,10 @@ for name, model, truth, noise in CASES:
     spoiled = y.copy()
     spoiled[2::5] += np.array([1.5, -1.2, 1.8] if name == "gaussian" else [6.0, -7.0, 8.0])
     put(f"{name}.spoiled", spoiled)
+    for suffix, weights in (("", None), (".weighted", w)):
+        omega = np.ones(n) if weights is None else weights
+        p, _ = optimize.curve_fit(model, x, spoiled, truth, sigma=1 / np.sqrt(omega))
+        put(f"{name}{suffix}.bisquare", bisquare(model, x, spoiled, p, omega))
     if name == "line":
         a_eq = np.hstack([x[:, None], np.ones((n, 1)), np.eye(n), -np.eye(n)])
         cost = np.concatenate([np.zeros(2), np.ones(2 * n)])
