@@ -414,7 +414,8 @@ KRNUMER_API void KR_BesselJs(int32_t n, double x, double* out);
 /**
  * Spherical Bessel function of the second kind, y_n(x) = sqrt(pi / (2x)) Y_(n + 1/2)(x), for x >= 0.
  *
- * Absolute error 1e-12 for n up to 10, 2e-13 above. -infinity at x = 0, 0 at +infinity. NaN for negative x and for n outside -200 to 199.
+ * Absolute error 1e-12 for n up to 10, 2e-13 above. -infinity at x = 0, 0 at +infinity. NaN for negative x and for n
+ * outside -200 to 199.
  *
  * @param[in]  n    order
  * @param[in]  x    x >= 0

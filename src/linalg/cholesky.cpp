@@ -1,5 +1,5 @@
-// The packed columns of L are what they are in memory: the rows of the upper triangle U = L^T. A few rows are reduced by
-// all finished ones at once. Every element is still reduced by the products of rows 0, 1, 2, ... in this order.
+// The packed columns of L are what they are in memory: the rows of the upper triangle U = L^T. A few rows are reduced
+// by all finished ones at once. Every element is still reduced by the products of rows 0, 1, 2, ... in this order.
 #include "linalg/cholesky.h"
 
 #include <algorithm>

@@ -83,7 +83,7 @@ TEST_F(Fft2dEntry, AgreesWithTheDefinition) {
         const std::vector<LongComplex> expected = Reference2d(Widened(x), r, c);
         const std::vector<LongComplex> expected_real = Reference2d({real.begin(), real.end()}, r, c);
         for (int32_t shift : {0, 1}) {
-            const auto placed = [&](const auto& z) { return shift != 0 ? Shifted2d(z, r, c) : z; };
+            const auto placed = [&, r = r, c = c](const auto& z) { return shift != 0 ? Shifted2d(z, r, c) : z; };
             HostMatrix<Complex> out, back;
             HostMatrix<double> real_back;
             ASSERT_EQ(CxFFT2D_H(in.handle(), 0, 0, r, c, shift, out.handle(), &columns, &rows), kOk);

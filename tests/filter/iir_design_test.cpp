@@ -15,8 +15,6 @@
 namespace krnumer {
 namespace {
 
-using testing::ElementsAre;
-
 enum Family : int32_t { kButterworth, kBessel, kChebyshev, kInverseChebyshev, kElliptic };
 constexpr Family kFamilies[] = {kButterworth, kBessel, kChebyshev, kInverseChebyshev, kElliptic};
 

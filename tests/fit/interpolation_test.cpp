@@ -390,7 +390,7 @@ class Outliers : public testing::Test {
     HostArray<uint8_t> mask_{9};
     HostArray<int32_t> removed_{9};
 
-    int32_t ByIndex(std::vector<int32_t> indices) {
+    int32_t ByIndex(const std::vector<int32_t>& indices) {
         return RmvOutlierIndx_head(HostArray<double>(y_).handle(), HostArray<double>(x_).handle(),
                                    HostArray<double>(w_).handle(), HostArray<int32_t>(indices).handle(),
                                    y_out_.handle(), x_out_.handle(), w_out_.handle(), mask_.handle());

@@ -17,7 +17,6 @@ namespace krnumer {
 namespace {
 
 using testing::ElementsAre;
-using testing::IsEmpty;
 
 template <class T>
 HostMatrix<T> Host(const DenseMatrix<T>& a) {

@@ -11,7 +11,6 @@
 namespace krnumer {
 namespace {
 
-using testing::Each;
 
 template <class T>
 bool IsUpperTrapezoidal(const Matrix<T>& r) {
