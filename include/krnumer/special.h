@@ -429,7 +429,7 @@ KRNUMER_API void KR_BesselYs(int32_t n, double x, double* out);
  * Chebyshev series for v = 0 and 1, relative error 1e-15. Other integers by Miller's downward recurrence from 2 (|v| +
  * sqrt(100 |v|)), wherever x is: relative error 1e-13 for x up to 30, but I_2 is 6e-13 off at x = 40, 8e-7 at 100 and
  * 1e-4 at 200, I_3 7e-2 at 500. Other orders from Kummer's function M(v + 1/2, 2v + 1, 2x), from the power series for
- * v = -1/2, -3/2, ...: relative error 2e-13 for v up to 30 and x up to 300.
+ * v = -1/2, -3/2, ...: relative error 1e-13 for x up to 30, 2e-11 up to 300.
  *
  * At x = 0, 1 for v = 0, 0 for other integers and positive v, otherwise an infinity with the sign of Gamma(v + 1).
  * +infinity at x = +infinity, 0 for infinite v and x = 0. NaN for x = -infinity, v = -infinity, |v| above 2^31, and

@@ -115,7 +115,9 @@ double BesselJn(double n, double x) {
 }
 
 double BesselYn(double n, double x) {
-    return n == 0.0 ? BesselY0(x) : Upward(BesselY0(x), BesselY1(x), n, x);
+    if (n == 0.0) return BesselY0(x);
+    if (n == 1.0) return BesselY1(x);
+    return Upward(BesselY0(x), BesselY1(x), n, x);
 }
 
 }  // namespace krnumer

@@ -9,6 +9,7 @@
 #include "special/domain.h"
 #include "special/gamma.h"
 #include "special/hypergeometric.h"
+#include "special/parity.h"
 #include "special/polynomial.h"
 
 namespace krnumer {
@@ -58,7 +59,7 @@ double ModifiedOfInteger(double n, double x) {
     if (n == 0.0) return BesselI0(x);
     if (n == 1.0) return BesselI1(x);
     const double value = Miller(n, std::abs(x));
-    return x < 0.0 && std::fmod(n, 2.0) != 0.0 ? -value : value;
+    return x < 0.0 && IsOdd(n) ? -value : value;
 }
 
 // The power series, for orders where Kummer's function has a pole.
@@ -97,7 +98,7 @@ double BesselI(double v, double x) {
     if (v < kLeastOrder || x < 0.0) return DomainError(kQuietNaN);
     if (x == 0.0) {
         if (v > 0.0) return 0.0;
-        return DomainError(std::fmod(std::floor(v), 2.0) == 0.0 ? -kInfinity : kInfinity);
+        return DomainError(IsOdd(std::floor(v)) ? kInfinity : -kInfinity);
     }
     const double a = v + 0.5;
     if (a <= 0.0 && a == std::floor(a)) return ModifiedSeries(v, x);
@@ -111,9 +112,10 @@ double BesselK(int32_t n, double x) {
     if (x == 0.0) return DomainError(kInfinity);
     if (x < 0.0) return DomainError(kQuietNaN);
     const double order = std::abs(static_cast<double>(n));
-    double below = BesselK0(x);
-    if (order == 0.0) return below;
+    if (order == 0.0) return BesselK0(x);
     double value = BesselK1(x);
+    if (order == 1.0) return value;
+    double below = BesselK0(x);
     for (double j = 1.0; j < order; j += 1.0) {
         const double above = 2.0 * j * value / x + below;
         below = value;

@@ -9,6 +9,7 @@
 #include "special/bessel_uniform.h"
 #include "special/domain.h"
 #include "special/gamma.h"
+#include "special/parity.h"
 
 namespace krnumer {
 namespace {
@@ -16,10 +17,6 @@ namespace {
 constexpr double kLeastOrder = -200.0;  // of orders that are no integers
 constexpr double kUniformFrom = 200.0;
 constexpr double kLargestInteger = 2147483647.0;
-
-bool IsOdd(double integer) {
-    return std::fmod(integer, 2.0) != 0.0;
-}
 
 // The power series in -x^2 / 4.
 double JvSeries(double v, double x) {

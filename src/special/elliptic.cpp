@@ -4,6 +4,7 @@
 
 #include "special/domain.h"
 #include "special/elliptic_coefficients.h"
+#include "special/parity.h"
 #include "special/polynomial.h"
 
 namespace krnumer {
@@ -78,7 +79,7 @@ double EllipticF(double phi, double m) {
         if (quarters >= kMostQuarters) return kQuietNaN;
         if (m == 1.0) return Signed(kInfinity, phi);
         const double whole = std::floor(quarters);
-        const double even = whole + std::fmod(whole, 2.0);
+        const double even = IsOdd(whole) ? whole + 1.0 : whole;
         return Signed(even * EllipticK(m) + EllipticF((quarters - even) * kHalfPi, m), phi);
     }
     if (phi == 0.0) return 0.0;

@@ -6,6 +6,7 @@
 
 #include "special/domain.h"
 #include "special/gamma_coefficients.h"
+#include "special/parity.h"
 #include "special/polynomial.h"
 
 namespace krnumer {
@@ -22,7 +23,7 @@ double ReflectedGamma(double x) {
     const double size = std::abs(x);
     const double whole = std::floor(size);
     if (whole == size) return DomainError(kQuietNaN);
-    const double sign = std::fmod(whole, 2.0) != 0.0 ? 1.0 : -1.0;
+    const double sign = IsOdd(whole) ? 1.0 : -1.0;
     double fraction = size - whole;
     if (fraction >= 0.5) fraction = size - (whole + 1.0);
     const double z = size * std::sin(kPi * fraction);

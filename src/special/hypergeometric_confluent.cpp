@@ -8,14 +8,16 @@
 #include "special/gamma.h"
 #include "special/hypergeometric.h"
 #include "special/hypergeometric_series.h"
+#include "special/parity.h"
 
 namespace krnumer {
 namespace {
 
 constexpr double kLargest = std::numeric_limits<double>::max();
 
-// Whether a product with `factor` would overflow.
+// Whether their product would overflow. The first test only spares a division.
 bool Overflows(double factor, double largest) {
+    if (std::abs(factor) < 1e150 && largest < 1e150) return false;
     return std::abs(factor) > 1.0 && largest > kLargest / std::abs(factor);
 }
 
@@ -102,12 +104,12 @@ Estimate Hy1F1Asym(double a, double b, double x) {
 double KummerAtInfinity(double a, double b) {
     if (a == 0.0) return b == 0.0 ? DomainError(kInfinity) : 1.0;
     const auto is_pole = [](double z) { return z <= 0.0 && z == std::floor(z); };
-    const auto is_negative = [](double z) { return z < 0.0 && std::fmod(std::floor(z), 2.0) != 0.0; };  // Gamma
+    const auto is_negative = [](double z) { return z < 0.0 && IsOdd(std::floor(z)); };  // Gamma
     if (is_pole(b) && !(is_pole(a) && a > b)) return DomainError(kInfinity);
     if (!is_pole(a)) return is_negative(a) == is_negative(b) ? kInfinity : -kInfinity;
     // (a)_n / (b)_n with n = -a: the first has the sign of (-1)^n, the second one - for every negative factor.
     const double negative_factors = b < 0.0 ? std::min(-a, std::ceil(-b)) : 0.0;
-    return std::fmod(-a + negative_factors, 2.0) == 0.0 ? kInfinity : -kInfinity;
+    return IsOdd(negative_factors - a) ? -kInfinity : kInfinity;
 }
 
 // U by M, for b that is no integer.

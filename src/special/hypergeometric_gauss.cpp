@@ -8,6 +8,7 @@
 #include "special/gamma.h"
 #include "special/hypergeometric.h"
 #include "special/hypergeometric_series.h"
+#include "special/parity.h"
 
 namespace krnumer {
 namespace {
@@ -101,7 +102,7 @@ double AboutOneByPsi(double a, double b, double c, double x) {
     }
     finite *= Gamma(e) * Gamma(c) * ReciprocalGamma(a + above) * ReciprocalGamma(b + above);
     y *= Gamma(c) * ReciprocalGamma(a + below) * ReciprocalGamma(b + below);
-    if (std::fmod(whole, 2.0) != 0.0) y = -y;
+    if (IsOdd(whole)) y = -y;
     (whole > 0.0 ? y : finite) *= std::pow(s, whole);
     return y + finite;
 }

@@ -6,6 +6,7 @@
 
 #include "special/domain.h"
 #include "special/gamma.h"
+#include "special/parity.h"
 
 namespace krnumer {
 namespace {
@@ -40,10 +41,6 @@ double SumInGroups(double sum, Term&& term) {
         if (!std::isfinite(change)) return kQuietNaN;
         if (std::abs(change) < kEpsilon) return sum;
     }
-}
-
-bool IsOdd(double integer) {
-    return std::fmod(integer, 2.0) != 0.0;
 }
 
 // (x / 2)^n / n! is below the smallest double.

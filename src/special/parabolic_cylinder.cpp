@@ -5,6 +5,7 @@
 #include <cmath>
 
 #include "special/domain.h"
+#include "special/parity.h"
 
 namespace krnumer {
 namespace {
@@ -21,10 +22,6 @@ double GammaRatio(double z) {
     const double s = ((u / 3.0 - 1.0) * (u / 7.0) + 1.0) * u / 60.0;
     const double exponent = (s - 1.0) / (12.0 * z) - (std::log(z) - 1.0) * z;
     return product * std::exp(exponent) * std::sqrt(z / 2.0);
-}
-
-bool IsOdd(double integer) {
-    return std::fmod(integer, 2.0) != 0.0;
 }
 
 double AtMinusInfinity(double v) {

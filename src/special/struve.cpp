@@ -8,15 +8,12 @@
 #include "special/domain.h"
 #include "special/gamma.h"
 #include "special/hypergeometric_series.h"
+#include "special/parity.h"
 
 namespace krnumer {
 namespace {
 
 constexpr Estimate kSkipped{0.0, 1e38};
-
-bool IsOdd(double integer) {
-    return std::fmod(integer, 2.0) != 0.0;
-}
 
 // For x > 0.
 double OfPositive(double v, double x) {

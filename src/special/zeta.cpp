@@ -19,7 +19,7 @@ double OddSum(double x) {
         term = std::pow(n, -x);
         sum += term;
     } while (term / sum > kEpsilon);
-    return sum / (1.0 - std::pow(2.0, -x));
+    return sum / (1.0 - std::exp2(-x));
 }
 
 double ReflectedZeta(double x) {
@@ -41,11 +41,11 @@ double Zeta(double x) {
     if (x < 1.0) return PolyEval(x, kZetaR) / ((1.0 - x) * PolyEvalMonic(x, kZetaS)) + 1.0;
     if (x <= 10.0) {
         const double w = 1.0 / x;
-        const double b = std::pow(2.0, x) * (x - 1.0);
+        const double b = std::exp2(x) * (x - 1.0);
         return x * PolyEval(w, kZetaP) / (b * PolyEvalMonic(w, kZetaQ)) + 1.0;
     }
     if (x <= 50.0) {
-        return std::exp(PolyEval(x, kZetaA) / PolyEvalMonic(x, kZetaB)) + std::pow(2.0, -x) + 1.0;
+        return std::exp(PolyEval(x, kZetaA) / PolyEvalMonic(x, kZetaB)) + std::exp2(-x) + 1.0;
     }
     return OddSum(x);
 }

@@ -27,8 +27,10 @@ class Point:
 
     @property
     def relative(self):
-        return float(abs(mpmath.mpf(self.computed) / self.true - 1)) if self.true and math.isfinite(self.computed) \
-            else math.inf if self.computed != self.true else 0.0
+        """Infinite where the true value is 0 and the computed one is not."""
+        if self.computed == self.true:
+            return 0.0
+        return float(self.absolute / abs(self.true)) if self.true else math.inf
 
     @property
     def ulps(self):

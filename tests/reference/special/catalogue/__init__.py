@@ -22,6 +22,7 @@ class Region:
     draw: Callable  # of a random.Random: one tuple of arguments, or one argument
     edges: list = field(default_factory=list)
     in_golden: bool = True  # False where no digit is promised
+    note: str = ""  # why the method is not accurate here
 
     def arguments(self, count, key):
         rng = random.Random(f"{key}/{self.name}")

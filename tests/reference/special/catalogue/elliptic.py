@@ -18,7 +18,7 @@ def complement(low, high):
 COMPLETE = [
     Region("0 to 0.9", uniform(0.0, 0.9), [0.0, 0.5, 5e-324]),
     Region("0.9 to 1 - 7e-6", complement(7.1e-6, 0.1), [1.0 - 7.1e-6]),
-    Region("from 1 - 7e-6", complement(1e-15, 6.9e-6), [1.0 - 6.999e-6]),
+    Region("from 1 - 7e-6", complement(1e-15, 6.9e-6), [1.0 - 6.999e-6], note="K is the bare logarithm"),
 ]
 
 INCOMPLETE = [
@@ -27,8 +27,8 @@ INCOMPLETE = [
     Region("several periods", every(uniform(-12.0, 12.0), uniform(0.0, 0.99)),
            [(k * HALF_PI, 0.5) for k in (2, 3, 4, 5, 6, 7, -3, -4)] + [(math.nextafter(HALF_PI, 2.0), 0.5)]),
     Region("many periods", every(uniform(100.0, 1e5), uniform(0.0, 0.99))),
-    Region("m near 1", every(uniform(0.0, HALF_PI), complement(1e-12, 1e-2))),
-    Region("m near 1, several periods", every(uniform(2.0, 12.0), complement(1e-10, 1e-5))),
+    Region("m near 1", every(uniform(0.0, HALF_PI), complement(1e-12, 1e-2)), note="E stands on K"),
+    Region("m near 1, several periods", every(uniform(2.0, 12.0), complement(1e-10, 1e-5)), note="multiples of K"),
     Region("m = 0", every(uniform(-10.0, 10.0), lambda rng: 0.0)),
 ]
 
@@ -80,7 +80,7 @@ FUNCTIONS = [
     ]),
     Function("zeta", "ζ(x)", "KR_Zeta", "d", mp.zeta, regions=[
         Region("below 0", uniform(-30.8, 0.0), [-0.5, -3.5, -30.8148, -1.0, -3.0]),
-        Region("near its zeros", near_integer(-14, -2, 1e-10), [-2.0, -4.0, -20.0]),
+        Region("near its zeros", near_integer(-14, -2, 1e-10), [-2.0, -4.0, -20.0], note="not exactly 0 there"),
         Region("0 to 1", uniform(0.0, 1.0), [0.0, 0.5]),
         Region("near 1", near_integer(1, 1, 1e-12, 0.1)),
         Region("1 to 10", uniform(1.0, 10.0), around(10.0) + [2.0, 3.0]),

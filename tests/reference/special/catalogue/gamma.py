@@ -60,11 +60,13 @@ def incomplete_beta(a, b, x):
 
 
 INCOMPLETE = [
-    Region("small a", every(log_uniform(1e-10, 1.0), log_uniform(1e-10, 20.0)), [(1.0, 1.0), (0.5, 1.0)]),
+    Region("small a", every(log_uniform(1e-10, 1.0), log_uniform(1e-10, 20.0)), [(1.0, 1.0), (0.5, 1.0)],
+           note="Q is 1 − P, absolutely accurate"),
     Region("moderate", scaled(log_uniform(1.0, 100.0), log_uniform(0.05, 5.0)), [(2.5, 1.0), (2.5, 6.0)]),
     Region("x near a", deviating(log_uniform(1.0, 1e4), uniform(-4.0, 4.0)),
-           [(a, x) for a in (1.0, 2.5, 10.0, 1000.0) for x in around(a)]),
-    Region("large a", deviating(log_uniform(1e4, 1e6), uniform(-4.0, 4.0))),
+           note="a difference of large logarithms",
+           edges=[(a, x) for a in (1.0, 2.5, 10.0, 1000.0) for x in around(a)]),
+    Region("large a", deviating(log_uniform(1e4, 1e6), uniform(-4.0, 4.0)), note="the same"),
 ]
 
 FUNCTIONS = [
@@ -89,20 +91,21 @@ FUNCTIONS = [
         Region("0 to 1", log_uniform(1e-300, 1.0)),
         Region("1 to 10", uniform(1.0, 10.0), around(1.4616321449683622, 10.0) + [float(n) for n in range(1, 11)]),
         Region("above 10", log_uniform(10.0, 1e300), around(1e9)),
-        Region("-30 to 0", uniform(-30.0, 0.0), [n - 0.5 for n in range(-29, 1)]),
-        Region("near poles", near_integer(-30, -1, 1e-6)),
-        Region("just below 0", log_uniform(1e-12, 1e-3, -1.0)),
-        Region("far below 0", log_uniform(100.0, 1e4, -1.0)),
+        Region("-30 to 0", uniform(-30.0, 0.0), [n - 0.5 for n in range(-29, 1)],
+               note="the tangent of πx is taken without reduction"),
+        Region("near poles", near_integer(-30, -1, 1e-6), note="the same"),
+        Region("just below 0", log_uniform(1e-12, 1e-3, -1.0), note="1 − x rounds x away"),
+        Region("far below 0", log_uniform(100.0, 1e4, -1.0), note="the tangent without reduction"),
     ]),
     Function("stirling", "Stirling's Γ(x)", "KR_Stirling", "d", mp.gamma, regions=[
         Region("33 to 171", uniform(33.0, 171.6), around(143.01608)),
-        Region("10 to 33", uniform(10.0, 33.0)),
-        Region("1 to 10", uniform(1.0, 10.0), [1.2]),
+        Region("10 to 33", uniform(10.0, 33.0), note="the approximation itself"),
+        Region("1 to 10", uniform(1.0, 10.0), [1.2], note="the approximation itself"),
     ]),
     Function("beta", "B(a, b)", "KR_Beta", "ddd", mp.beta, pack=lambda a, b: (a, b, NAN), regions=[
         Region("moderate", every(log_uniform(0.1, 100.0), log_uniform(0.1, 100.0))),
         Region("small", every(log_uniform(1e-150, 1.0), log_uniform(1e-150, 1.0))),
-        Region("large", every(log_uniform(100.0, 1e6), log_uniform(0.1, 20.0))),
+        Region("large", every(log_uniform(100.0, 1e6), log_uniform(0.1, 20.0)), note="a difference of large ln Γ"),
         Region("negative a", every(uniform(-30.0, 0.0), uniform(31.0, 60.0))),
         Region("negative a + b", every(uniform(-30.0, -10.0), uniform(0.0, 9.0))),
     ]),
@@ -124,7 +127,8 @@ FUNCTIONS = [
     ]),
     Function("incomplete_beta", "I_x(a, b)", "KR_Beta", "ddd", incomplete_beta, regions=[
         Region("a = 1", every(lambda rng: 1.0, log_uniform(1e-3, 50.0), uniform(0.0, 1.0)),
-               [(1.0, 3.637978807091712e-13, 0.5), (1.0, 4e-13, 0.5), (1.0, 1.0, 0.3)]),
+               [(1.0, 3.637978807091712e-13, 0.5), (1.0, 4e-13, 0.5), (1.0, 1.0, 0.3)],
+               note="1 − (1 − x)ᵇ cancels for small b"),
         Region("0.1 to 300", every(log_uniform(0.1, 300.0), log_uniform(0.1, 300.0), uniform(0.0, 1.0)),
                [(5.0, 50.0, 0.08), (2.0, 3.0, 0.4), (0.5, 0.5, 0.5)]),
         Region("near the mean", beta_point(log_uniform(0.5, 1000.0), uniform(-4.0, 4.0)),
@@ -132,7 +136,8 @@ FUNCTIONS = [
         Region("half-integers", every(lambda rng: rng.randint(1, 60) / 2, lambda rng: rng.randint(1, 60) / 2,
                                       uniform(0.0, 1.0))),
         Region("small b", every(log_uniform(1.0, 200.0), log_uniform(1e-3, 0.1), uniform(0.9, 1.0)),
-               [(200.0, 0.1, 0.999)]),
-        Region("1000 to 10000", beta_point(log_uniform(1e3, 1e4), uniform(-4.0, 4.0))),
+               [(200.0, 0.1, 0.999)], note="100 passes of the fraction are not enough"),
+        Region("1000 to 10000", beta_point(log_uniform(1e3, 1e4), uniform(-4.0, 4.0)),
+               note="a difference of large logarithms"),
     ]),
 ]

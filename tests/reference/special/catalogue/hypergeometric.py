@@ -68,10 +68,10 @@ def parameters(a, b, x):
 
 KUMMER = [
     Region("0 to 12", parameters((-4.0, 6.0), (0.1, 8.0), uniform(0.0, 12.0)), [(1.5, 2.5, 3.0)]),
-    Region("-12 to 0", parameters((-4.0, 6.0), (0.1, 8.0), uniform(-12.0, 0.0))),
+    Region("-12 to 0", parameters((-4.0, 6.0), (0.1, 8.0), uniform(-12.0, 0.0)), note="the series cancels"),
     Region("12 to 30", parameters((-4.0, 6.0), (0.1, 8.0), uniform(12.0, 30.0))),
     Region("-30 to -12", parameters((0.5, 3.0), (0.5, 5.0), uniform(-30.0, -12.0)),
-           [(1.5, 2.5, -15.0), (1.5, 2.5, -20.0), (1.5, 2.5, -29.9)]),
+           [(1.5, 2.5, -15.0), (1.5, 2.5, -20.0), (1.5, 2.5, -29.9)], note="the series cancels"),
     Region("-300 to -30", parameters((0.5, 3.0), (0.5, 5.0), uniform(-300.0, -30.0)), [(1.5, 2.5, -40.0)]),
     Region("30 to 100", parameters((-4.0, 6.0), (0.1, 8.0), uniform(30.0, 100.0)), [(1.5, 2.5, 60.0)]),
     Region("100 to 600", parameters((0.1, 3.0), (0.1, 5.0), uniform(100.0, 600.0)),
@@ -79,19 +79,21 @@ KUMMER = [
     Region("b near a", lambda rng: (lambda a: (a, a * (1.0 + rng.uniform(-1e-4, 1e-4)), rng.uniform(-12.0, 12.0)))
            (rng.uniform(0.5, 10.0))),
     Region("polynomial", every(integer(-10, 0), uniform(0.1, 8.0), uniform(-20.0, 20.0))),
-    Region("negative b", parameters((0.5, 4.0), (-5.9, -5.1), uniform(-8.0, 8.0))),
+    Region("negative b", parameters((0.5, 4.0), (-5.9, -5.1), uniform(-8.0, 8.0)), note="the series cancels"),
 ]
 
 TRICOMI = [
     Region("to 6", every(uniform(0.1, 3.0), lambda rng: rng.randint(-2, 3) + rng.uniform(0.05, 0.95),
-                         log_uniform(1e-3, 6.0)), [(0.7, 1.3, 2.0)]),
+                         log_uniform(1e-3, 6.0)), [(0.7, 1.3, 2.0)], note="two series cancel"),
     Region("to 6, integer b", every(uniform(0.1, 3.0), lambda rng: float(rng.randint(-1, 3)), log_uniform(0.1, 6.0)),
-           [(0.7, 1.0, 2.0)]),
+           [(0.7, 1.0, 2.0)], note="the mean of the values on both sides"),
     Region("to 6, b near an integer", every(uniform(0.1, 3.0), lambda rng: rng.randint(0, 2) + rng.uniform(-5e-4, 5e-4),
-                                            log_uniform(0.1, 6.0)), [(0.7, 1.0001, 2.0), (0.7, 2.0001, 2.0)]),
+                                            log_uniform(0.1, 6.0)), [(0.7, 1.0001, 2.0), (0.7, 2.0001, 2.0)],
+           note="the value at the integer"),
     Region("to 6, polynomial", every(integer(-3, 0), uniform(0.1, 0.9), log_uniform(0.1, 6.0)), [(-1, 0.5, 2.0)]),
-    Region("6 to 15", parameters((0.1, 1.0), (0.1, 1.0), uniform(6.0, 15.0))),
-    Region("15 to 40", parameters((0.1, 2.0), (0.1, 2.0), uniform(15.0, 40.0)), [(0.5, 0.5, 20.0)]),
+    Region("6 to 15", parameters((0.1, 1.0), (0.1, 1.0), uniform(6.0, 15.0)), note="only asymptotic"),
+    Region("15 to 40", parameters((0.1, 2.0), (0.1, 2.0), uniform(15.0, 40.0)), [(0.5, 0.5, 20.0)],
+           note="only asymptotic"),
     Region("above 40", parameters((0.1, 2.0), (0.1, 2.0), log_uniform(40.0, 1e10))),
 ]
 
@@ -110,12 +112,15 @@ FUNCTIONS = [
     Function("tricomi", "U(a, b, x)", "KR_Tricomi", "ddd", mp.hyperu, TRICOMI, pack=lambda a, b, x: (x, float(a), b)),
     Function("parabolic_cylinder", "D_v(x)", "KR_ParabolicCylinder", "dd", parabolic_cylinder, pack=lambda v, x: (x, v),
              regions=[
-        Region("-4 to 4", every(uniform(-5.0, 10.0), uniform(-4.0, 4.0)), [(0.5, 1.0), (-1.5, 1.0), (2.0, -2.0)]),
-        Region("integer v", every(lambda rng: float(rng.randint(0, 12)), uniform(-4.0, 4.0)), [(1.0, 0.0), (2.0, 1.0)]),
-        Region("large v", every(uniform(20.0, 150.0), uniform(-0.01, 0.01))),
-        Region("negative v", every(uniform(-60.0, -5.0), uniform(-4.0, 0.5))),
-        Region("below -4", every(uniform(-5.0, 5.0), uniform(-15.0, -4.0))),
-        Region("4 to 6", every(uniform(-3.0, 3.0), uniform(4.0, 6.0)), [(0.5, 4.0), (0.5, 6.0)]),
-        Region("6 to 8", every(uniform(-3.0, 3.0), uniform(6.0, 8.0)), [(0.5, 8.0)]),
+        Region("-4 to 4", every(uniform(-5.0, 10.0), uniform(-4.0, 4.0)), [(0.5, 1.0), (-1.5, 1.0), (2.0, -2.0)],
+               note="a short Stirling series for both solutions, 4e-9"),
+        Region("integer v", every(lambda rng: float(rng.randint(0, 12)), uniform(-4.0, 4.0)), [(1.0, 0.0), (2.0, 1.0)],
+               note="the same"),
+        Region("large v", every(uniform(20.0, 150.0), uniform(-0.01, 0.01)), note="the same"),
+        Region("negative v", every(uniform(-60.0, -5.0), uniform(-4.0, 0.5)), note="both solutions cancel"),
+        Region("below -4", every(uniform(-5.0, 5.0), uniform(-15.0, -4.0)), note="the Stirling series"),
+        Region("4 to 6", every(uniform(-3.0, 3.0), uniform(4.0, 6.0)), [(0.5, 4.0), (0.5, 6.0)],
+               note="both solutions cancel"),
+        Region("6 to 8", every(uniform(-3.0, 3.0), uniform(6.0, 8.0)), [(0.5, 8.0)], note="both solutions cancel"),
     ]),
 ]

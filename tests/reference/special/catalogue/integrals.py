@@ -31,8 +31,9 @@ def exp_integral(n, x):
 FRESNEL = [
     Region("to 1.6", log_uniform(1e-5, math.sqrt(2.5625)), around(math.sqrt(2.5625))),
     Region("1.6 to 40", uniform(1.6008, 40.0), around(1.6008, 3.0)),
-    Region("40 to 36974", log_uniform(40.0, 36974.0), [36974.0]),
-    Region("above 36974", log_uniform(36974.1, 1e7), [math.nextafter(36974.0, 1e9)]),
+    Region("40 to 36974", log_uniform(40.0, 36974.0), [36974.0], note="the phase loses digits as x²"),
+    Region("above 36974", log_uniform(36974.1, 1e7), [math.nextafter(36974.0, 1e9)],
+           note="the limit stands for the value"),
     Region("negative", uniform(-20.0, 0.0)),
 ]
 
@@ -47,7 +48,7 @@ HYPERBOLIC = [
     Region("to 8", log_uniform(1e-8, 8.0), around(8.0)),
     Region("8 to 18", uniform(8.0, 18.0), around(18.0)),
     Region("18 to 88", uniform(18.0, 88.0), around(88.0)),
-    Region("88 to 709", uniform(88.0, 709.0), [100.0, 200.0, 500.0, 709.0]),
+    Region("88 to 709", uniform(88.0, 709.0), [100.0, 200.0, 500.0, 709.0], note="the series is fitted up to 88"),
 ]
 
 FUNCTIONS = [
