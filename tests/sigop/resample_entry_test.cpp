@@ -86,14 +86,15 @@ TYPED_TEST(ResampleConstExports, InitialiseTheState) {
     EXPECT_EQ(this->taps_.size(), 6);
     EXPECT_EQ(this->y_.size(), 2);  // room for 3 / 2, rounded up
     EXPECT_EQ(this->outputs_, 0);
-    EXPECT_EQ(this->state_.historyCount, 3);
-    EXPECT_EQ(this->state_.gain, 1.0);
-    EXPECT_EQ(this->state_.left, 2);
-    EXPECT_EQ(this->state_.right, 2);
-    EXPECT_EQ(this->state_.mode, 1);
-    EXPECT_EQ(this->state_.ratio, 2.0);
-    EXPECT_EQ(this->state_.frac, 0.75);
-    EXPECT_EQ(this->state_.index, 1);
+    // The fields of the record have no address that fits them: + makes them values.
+    EXPECT_EQ(+this->state_.historyCount, 3);
+    EXPECT_EQ(+this->state_.gain, 1.0);
+    EXPECT_EQ(+this->state_.left, 2);
+    EXPECT_EQ(+this->state_.right, 2);
+    EXPECT_EQ(+this->state_.mode, 1);
+    EXPECT_EQ(+this->state_.ratio, 2.0);
+    EXPECT_EQ(+this->state_.frac, 0.75);
+    EXPECT_EQ(+this->state_.index, 1);
 }
 
 TYPED_TEST(ResampleConstExports, AFailureLeavesTheStateAndEmptiesTheOutput) {
