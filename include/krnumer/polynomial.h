@@ -49,6 +49,20 @@ KRNUMER_API int32_t PolyRootsNtBst_head(KrHandle coef, KrHandle newtonGuesses, i
                                         KrHandle pairGuesses, int32_t pairLimit, double pairTol, KrHandle roots);
 
 /**
+ * All roots of a complex polynomial without guesses (K. Madsen, BIT 13, 71, 1973): one after the other by Newton's
+ * method with a search along the step, each divided out before the next.
+ *
+ * @param[in,out] coef   coefficients, 1-D complex double; on return one element less: the roots in the order in which
+ * they were found, those at 0 first. Zeros in the place of the highest coefficients give fewer roots, and zeros behind
+ * them. Emptied on failure
+ * @param[in]     limit  how often the step towards a root may be turned in a row before the search is given up
+ * @param[out]    err    status: 0; -20003 when `coef` is empty; -20063 for a coefficient that is not finite, and when
+ * nothing but a constant is left; -20062 without convergence; -20001 without memory
+ * @return               0
+ */
+KRNUMER_API int32_t CxPolyRoots_head(KrHandle coef, const int32_t* limit, int32_t* err);
+
+/**
  * Approximate greatest common divisor of two polynomials, from the singular values of Sylvester matrices (R. M. Corless
  * et al., ISSAC 1995, 195).
  *

@@ -22,6 +22,12 @@ SWEEP(PolyRootsNtBst_head) {
     return scene.Call([&] { return PolyRootsNtBst_head(coef, guesses, 20, 1e-12, pairs, 20, 1e-12, roots); });
 }
 
+SWEEP(CxPolyRoots_head) {
+    const KrHandle coef = scene.Replaced(scene.Complexes({{0, 0}, {24, 2}, {-50, 1}, {35, 0}, {-10, -3}, {1, 0}}));
+    const int32_t limit = 20;
+    return scene.Call([&] { return CxPolyRoots_head(coef, &limit, scene.err()); });
+}
+
 SWEEP(PolyGCD_H) {
     const KrHandle p = scene.Doubles({0, -6, 1, 1});
     const KrHandle q = scene.Doubles({0, -2, -1, 1});
