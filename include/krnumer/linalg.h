@@ -14,6 +14,7 @@
 
 #include <krnumer/linalg_basic.h>
 #include <krnumer/linalg_eigen.h>
+#include <krnumer/linalg_equations.h>
 #include <krnumer/linalg_factor.h>
 #include <krnumer/linalg_inverse.h>
 #include <krnumer/linalg_measures.h>

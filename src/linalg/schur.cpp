@@ -18,36 +18,8 @@ namespace {
 int32_t DecompositionStatus(int32_t info, int32_t n) {
     if (info == 0) return kOk;
     if (info < 0) return kLapackError;
-    if (info <= n) return kNoConvergence;
-    return info == n + 1 ? kReorderingFailed : kReorderingIllConditioned;
-}
-
-// The decomposition in column-major arrays; `vectors` is null where there are none.
-int32_t Decompose(double* t, int32_t n, double* vectors, Complex* w) {
-    Scratch<double> values(2 * Count(n));
-    Scratch<double> work;
-    if (!values) return kOutOfMemory;
-    double* const wr = values.data();
-    double* const wi = wr + n;
-    int32_t info = 0;
-    const auto call = [&](double* space, int32_t size) {
-        return lapack::Gees(vectors != nullptr ? 'V' : 'N', n, t, n, wr, wi, vectors, n, space, size);
-    };
-    if (const int32_t status = lapack::CallWithWorkspace(info, work, call)) return status;
-    for (int32_t i = 0; i < n; ++i) w[i] = {wr[i], wi[i]};
-    return DecompositionStatus(info, n);
-}
-
-int32_t Decompose(Complex* t, int32_t n, Complex* vectors, Complex* w) {
-    Scratch<double> rwork(Count(n));
-    Scratch<Complex> work;
-    if (!rwork) return kOutOfMemory;
-    int32_t info = 0;
-    const auto call = [&](Complex* space, int32_t size) {
-        return lapack::Gees(vectors != nullptr ? 'V' : 'N', n, t, n, w, vectors, n, space, size, rwork.data());
-    };
-    if (const int32_t status = lapack::CallWithWorkspace(info, work, call)) return status;
-    return DecompositionStatus(info, n);
+    if (info == n + 1) return kReorderingFailed;
+    return info == n + 2 ? kReorderingIllConditioned : kNoConvergence;
 }
 
 template <class T>
@@ -82,6 +54,33 @@ int32_t Sort(T* t, int32_t n, T* vectors, Complex* w, int32_t order) {
 
 }  // namespace
 
+int32_t DecomposeColumns(double* t, int32_t n, double* vectors, Complex* w, int32_t size) {
+    Scratch<double> values(2 * Count(n));
+    Scratch<double> work;
+    if (!values) return kOutOfMemory;
+    double* const wr = values.data();
+    double* const wi = wr + n;
+    int32_t info = 0;
+    const auto call = [&](double* space, int32_t lwork) {
+        return lapack::Gees(vectors != nullptr ? 'V' : 'N', n, t, n, wr, wi, vectors, n, space, lwork);
+    };
+    if (const int32_t status = lapack::CallWithWorkspace(info, work, call)) return status;
+    for (int32_t i = 0; i < n; ++i) w[i] = {wr[i], wi[i]};
+    return DecompositionStatus(info, size);
+}
+
+int32_t DecomposeColumns(Complex* t, int32_t n, Complex* vectors, Complex* w, int32_t size) {
+    Scratch<double> rwork(Count(n));
+    Scratch<Complex> work;
+    if (!rwork) return kOutOfMemory;
+    int32_t info = 0;
+    const auto call = [&](Complex* space, int32_t lwork) {
+        return lapack::Gees(vectors != nullptr ? 'V' : 'N', n, t, n, w, vectors, n, space, lwork, rwork.data());
+    };
+    if (const int32_t status = lapack::CallWithWorkspace(info, work, call)) return status;
+    return DecompositionStatus(info, size);
+}
+
 template <class T>
 int32_t SchurCore(const T* a, int32_t n, int32_t order, T* z, T* t, Complex* w) {
     if (!IsEigenvalueOrder(order)) return kBadSelector;
@@ -92,7 +91,7 @@ int32_t SchurCore(const T* a, int32_t n, int32_t order, T* z, T* t, Complex* w) 
     Scratch<T> vectors;
     if (!columns || (z != nullptr && !vectors.Allocate(elements))) return kOutOfMemory;
     if (const int32_t status = TransposeCore(a, n, n, columns.data())) return status;
-    if (const int32_t status = Decompose(columns.data(), n, vectors.data(), w)) return status;
+    if (const int32_t status = DecomposeColumns(columns.data(), n, vectors.data(), w, n)) return status;
     if (order != kNoOrder) {
         if (const int32_t status = Sort(columns.data(), n, vectors.data(), w, order)) return status;
     }

@@ -25,4 +25,9 @@ inline bool IsEigenvalueOrder(int32_t order) {
 template <class T>
 int32_t SchurCore(const T* a, int32_t n, int32_t order, T* z, T* t, Complex* w);
 
+// The decomposition in place and column-major, in no order, without a look at the data. LAPACK's failures are told
+// apart by `size`, the order of the matrix: up to it -20062, then -20073 and -20074. -20999, -20001.
+int32_t DecomposeColumns(double* t, int32_t n, double* vectors, Complex* w, int32_t size);
+int32_t DecomposeColumns(Complex* t, int32_t n, Complex* vectors, Complex* w, int32_t size);
+
 }  // namespace krnumer
