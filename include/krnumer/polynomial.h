@@ -63,6 +63,35 @@ KRNUMER_API int32_t PolyRootsNtBst_head(KrHandle coef, KrHandle newtonGuesses, i
 KRNUMER_API int32_t CxPolyRoots_head(KrHandle coef, const int32_t* limit, int32_t* err);
 
 /**
+ * Distinct roots of a real polynomial and their multiplicities (Z. Zeng, Math. Comp. 74, 869, 2005): a multiple root is
+ * one root and not a cluster.
+ *
+ * A chain of approximate greatest common divisors gives the distinct roots and their multiplicities; with `distinct`, a
+ * Gauss-Newton iteration that holds the multiplicities improves the roots. Where the multiplicities do not sum to the
+ * degree, or the iteration does not converge, the last list becomes the eigenvalues of the companion matrix, of which
+ * only those that are equal to the last bit count as one root.
+ *
+ * @param[in,out] coef           coefficients, 1-D double; zeros in the place of the highest ones are left out. Kept on
+ * success, emptied on failure
+ * @param[in]     distinct       0 to leave out the second stage
+ * @param[in]     tol            residual below which a divisor is accepted, and 1/100 of the limit of its singular
+ * value; not positive for 1e-10
+ * @param[out]    roots          1-D complex double: the distinct roots of the first stage, the root 0 last
+ * @param[out]    distinctRoots  1-D complex double: the roots of the second stage by descending modulus, the root 0
+ * last; empty without it
+ * @param[out]    mult           1-D int32: multiplicities of `distinctRoots`, or without the second stage of `roots`
+ * @return                       0; -20003 when `coef` is empty; -20063 for a coefficient that is not finite, as it
+ * comes or over the highest one; -20111 when all are 0; -20021 for a constant; -20062 when eigenvalues or singular
+ * values do not converge; -20001 without memory or when an output cannot be sized. All arrays are emptied by a failure
+ */
+KRNUMER_API int32_t MultPolyRoots_head(KrHandle coef, int32_t distinct, double tol, KrHandle roots,
+                                       KrHandle distinctRoots, KrHandle mult);
+
+/** MultPolyRoots_head of a complex polynomial. */
+KRNUMER_API int32_t CxMultPolyRoots_head(KrHandle coef, int32_t distinct, double tol, KrHandle roots,
+                                         KrHandle distinctRoots, KrHandle mult);
+
+/**
  * Approximate greatest common divisor of two polynomials, from the singular values of Sylvester matrices (R. M. Corless
  * et al., ISSAC 1995, 195).
  *

@@ -28,6 +28,30 @@ SWEEP(CxPolyRoots_head) {
     return scene.Call([&] { return CxPolyRoots_head(coef, &limit, scene.err()); });
 }
 
+SWEEP(MultPolyRoots_head) {
+    const KrHandle coef = scene.Replaced(scene.Doubles({0, 12, -28, 23, -8, 1}));
+    const KrHandle roots = scene.OutComplexes();
+    const KrHandle distinct = scene.OutComplexes();
+    const KrHandle mult = scene.OutIntegers();
+    return scene.Call([&] { return MultPolyRoots_head(coef, 1, -1.0, roots, distinct, mult); });
+}
+
+SWEEP(MultPolyRoots_head_first_stage) {
+    const KrHandle coef = scene.Replaced(scene.Doubles({0, 12, -28, 23, -8, 1}));
+    const KrHandle roots = scene.OutComplexes();
+    const KrHandle distinct = scene.OutComplexes();
+    const KrHandle mult = scene.OutIntegers();
+    return scene.Call([&] { return MultPolyRoots_head(coef, 0, -1.0, roots, distinct, mult); });
+}
+
+SWEEP(CxMultPolyRoots_head) {
+    const KrHandle coef = scene.Replaced(scene.Complexes({{0, 0}, {0, 3}, {2, 4}, {2, -1}, {0, -2}, {1, 0}}));
+    const KrHandle roots = scene.OutComplexes();
+    const KrHandle distinct = scene.OutComplexes();
+    const KrHandle mult = scene.OutIntegers();
+    return scene.Call([&] { return CxMultPolyRoots_head(coef, 1, -1.0, roots, distinct, mult); });
+}
+
 SWEEP(PolyGCD_H) {
     const KrHandle p = scene.Doubles({0, -6, 1, 1});
     const KrHandle q = scene.Doubles({0, -2, -1, 1});
