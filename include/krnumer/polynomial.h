@@ -82,7 +82,8 @@ KRNUMER_API int32_t CxPolyRoots_head(KrHandle coef, const int32_t* limit, int32_
  * @param[out]    mult           1-D int32: multiplicities of `distinctRoots`, or without the second stage of `roots`
  * @return                       0; -20003 when `coef` is empty; -20063 for a coefficient that is not finite, as it
  * comes or over the highest one; -20111 when all are 0; -20021 for a constant; -20062 when eigenvalues or singular
- * values do not converge; -20001 without memory or when an output cannot be sized. All arrays are emptied by a failure
+ * values do not converge; -20068 when extreme coefficients overflow on the way; -20001 without memory or when an output
+ * cannot be sized. All arrays are emptied by a failure
  */
 KRNUMER_API int32_t MultPolyRoots_head(KrHandle coef, int32_t distinct, double tol, KrHandle roots,
                                        KrHandle distinctRoots, KrHandle mult);
