@@ -16,6 +16,7 @@
 #include <krnumer/linalg_eigen.h>
 #include <krnumer/linalg_equations.h>
 #include <krnumer/linalg_factor.h>
+#include <krnumer/linalg_function.h>
 #include <krnumer/linalg_inverse.h>
 #include <krnumer/linalg_measures.h>
 #include <krnumer/linalg_schur.h>
