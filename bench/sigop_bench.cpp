@@ -1,16 +1,24 @@
-// Convolution beside plain loops and beside FFTW, planned once and run at the next length it is fast at.
+// Convolution beside plain loops and beside FFTW, planned once and run at the next length it is fast at; changes of the
+// sampling rate beside liquid-dsp, which computes in single precision, and beside a copy of the samples.
 #include <benchmark/benchmark.h>
 
 #include <algorithm>
 #include <cmath>
+#include <cstring>
 #include <vector>
 
 #include "frame/numeric.h"
 #include "sigop/convolution.h"
 #include "sigop/convolution2d.h"
+#include "sigop/decimate.h"
+#include "sigop/polyphase.h"
+#include "sigop/resample.h"
 
 #ifdef KRNUMER_HAVE_FFTW
 #include <fftw3.h>
+#endif
+#ifdef KRNUMER_HAVE_LIQUID
+#include <liquid/liquid.h>
 #endif
 
 namespace krnumer {
@@ -161,6 +169,140 @@ void Planes(benchmark::State& state, int32_t algorithm) {
 }
 BENCHMARK_CAPTURE(Planes, direct, kDirect)->Unit(benchmark::kMillisecond);
 BENCHMARK_CAPTURE(Planes, frequency_domain, kFrequencyDomain)->Unit(benchmark::kMillisecond);
+
+// ---- Decimation: bytes of the input per second, beside a copy -----------------------------------------------------
+
+template <class Run>
+void Stream(benchmark::State& state, Run run) {
+    const std::vector<double> x = Samples<double>(1000000);
+    std::vector<double> y = x;
+    for (auto _ : state) {
+        run(x, y);
+        benchmark::DoNotOptimize(y.data());
+        benchmark::ClobberMemory();
+    }
+    state.SetBytesProcessed(state.iterations() * static_cast<int64_t>(x.size() * sizeof(double)));
+}
+
+void Copy(benchmark::State& state) {
+    Stream(state, [](const std::vector<double>& x, std::vector<double>& y) {
+        std::memcpy(y.data(), x.data(), x.size() * sizeof(double));
+    });
+}
+BENCHMARK(Copy);
+
+// In place: the block shrinks to its own beginning, and what is behind it stays, so that every run reads samples.
+void DecimateBlock(benchmark::State& state, bool averaging) {
+    const auto factor = static_cast<int32_t>(state.range(0));
+    int32_t count = 0;
+    Stream(state, [&](const std::vector<double>& x, std::vector<double>& y) {
+        Decimate(y.data(), static_cast<int32_t>(x.size()), factor, averaging, &count);
+    });
+}
+BENCHMARK_CAPTURE(DecimateBlock, every, false)->Arg(4)->Arg(100);
+BENCHMARK_CAPTURE(DecimateBlock, means, true)->Arg(4)->Arg(100);
+
+// ---- Resampling by 160/147 in blocks of 14700, filters of 10 samples to both sides; outputs per second -------------
+
+constexpr int32_t kUp = 160;
+constexpr int32_t kDown = 147;
+constexpr int32_t kBlock = 14700;
+constexpr int32_t kReach = 10;
+
+// A windowed sinc of 2 reach points per sample and side.
+std::vector<double> WindowedSinc(int32_t points_per_sample) {
+    const int32_t half = kReach * points_per_sample;
+    std::vector<double> taps;
+    for (int32_t i = -half; i <= half; ++i) {
+        const double t = kPi * i / points_per_sample;
+        taps.push_back((i == 0 ? 1.0 : std::sin(t) / t) * (0.5 + 0.5 * std::cos(kPi * i / (half + 1))) /
+                       points_per_sample);
+    }
+    return taps;
+}
+
+template <class T>
+void Rational(benchmark::State& state) {
+    const std::vector<double> filter = WindowedSinc(kUp);
+    const RationalRate rate{kUp, kDown, filter.data(), static_cast<int32_t>(filter.size())};
+    const std::vector<T> x = Samples<T>(kBlock);
+    std::vector<T> history(Count(RationalHistory(rate)));
+    std::vector<T> y(20000);
+    RationalStream stream{0, 0};
+    int64_t outputs = 0;
+    for (auto _ : state) {
+        const auto count = static_cast<int32_t>(RationalOutputCount(rate, stream, kBlock));
+        PolyphaseResample(x.data(), 1, kBlock, rate, &stream, history.data(), static_cast<int32_t>(history.size()),
+                          y.data(), count);
+        benchmark::DoNotOptimize(y.data());
+        outputs += count;
+    }
+    state.SetItemsProcessed(outputs);
+}
+BENCHMARK(Rational<double>);
+BENCHMARK(Rational<Complex>);
+
+template <class T, bool nearest>
+void Constant(benchmark::State& state) {
+    const std::vector<double> table = WindowedSinc(64);
+    const ResampleKernel kernel{table.data(), static_cast<int32_t>(table.size()), 64, nearest};
+    const std::vector<T> x = Samples<T>(kBlock);
+    std::vector<T> history(50);
+    std::vector<double> taps(50);
+    std::vector<T> y(20000);
+    ResampleStream<T> stream{};
+    stream.history = history.data();
+    stream.taps = taps.data();
+    stream.history_capacity = stream.taps_capacity = 50;
+    stream.ratio = static_cast<double>(kDown) / kUp;
+    int64_t outputs = 0;
+    for (auto _ : state) {
+        int32_t count = 0;
+        ResampleRun(x.data(), kBlock, kernel, &stream, y.data(), 20000, &count, true);
+        benchmark::DoNotOptimize(y.data());
+        outputs += count;
+    }
+    state.SetItemsProcessed(outputs);
+}
+BENCHMARK_TEMPLATE(Constant, double, false);
+BENCHMARK_TEMPLATE(Constant, double, true);
+BENCHMARK_TEMPLATE(Constant, Complex, false);
+
+#ifdef KRNUMER_HAVE_LIQUID
+
+void RationalLiquid(benchmark::State& state) {
+    const std::vector<double> filter = WindowedSinc(kUp);
+    std::vector<float> taps(filter.begin(), filter.end());
+    const rresamp_rrrf resampler = rresamp_rrrf_create(kUp, kDown, kReach, taps.data());
+    std::vector<float> x(kBlock, 1.0f);
+    std::vector<float> y(20000);
+    for (auto _ : state) {
+        rresamp_rrrf_execute_block(resampler, x.data(), kBlock / kDown, y.data());
+        benchmark::DoNotOptimize(y.data());
+    }
+    state.SetItemsProcessed(state.iterations() * (kBlock / kDown) * kUp);
+    rresamp_rrrf_destroy(resampler);
+}
+BENCHMARK(RationalLiquid);
+
+void ConstantLiquid(benchmark::State& state) {
+    const resamp_rrrf resampler =
+        resamp_rrrf_create(static_cast<float>(kUp) / static_cast<float>(kDown), kReach, 0.45f, 60.0f, 64);
+    std::vector<float> x(kBlock, 1.0f);
+    std::vector<float> y(20000);
+    int64_t outputs = 0;
+    for (auto _ : state) {
+        unsigned int count = 0;
+        resamp_rrrf_execute_block(resampler, x.data(), kBlock, y.data(), &count);
+        benchmark::DoNotOptimize(y.data());
+        outputs += count;
+    }
+    state.SetItemsProcessed(outputs);
+    resamp_rrrf_destroy(resampler);
+}
+BENCHMARK(ConstantLiquid);
+
+#endif
 
 }  // namespace
 }  // namespace krnumer

@@ -62,7 +62,9 @@ class RowPair {
         const int64_t to = std::min(taps_ - 1, last);
         int64_t middle_from = std::max<int64_t>(0, last - samples_ + 1);
         int64_t middle_to = std::min(taps_ - 1, first);
-        if (last - first + 1 < block_ || middle_from > middle_to) {
+        // A vector of one double holds no complex sample.
+        constexpr bool kHasVectors = HWY_TARGET != HWY_SCALAR;
+        if (!kHasVectors || last - first + 1 < block_ || middle_from > middle_to) {
             middle_from = from;
             middle_to = from - 1;
         }

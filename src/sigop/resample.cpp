@@ -8,6 +8,7 @@
 #include "frame/scratch.h"
 #include "frame/status.h"
 #include "sigop/history.h"
+#include "sigop/resample_group.h"
 
 namespace krnumer {
 namespace {
@@ -25,33 +26,35 @@ bool SplitPosition(double position, Split* split) {
     return true;
 }
 
-double ReadNearest(const ResampleKernel& kernel, double position) {
-    return kernel.table[std::clamp(TruncateToInt32(position + 0.5), 0, kernel.points - 1)];
-}
-
-// The last tap often stands exactly on the last point, which has none behind it.
-double ReadInterpolated(const ResampleKernel& kernel, double position) {
-    const int32_t i = std::clamp(TruncateToInt32(position), 0, kernel.points - 1);
+// A point of the table, or the value between it and the next. The last point has none behind it, and the last tap often
+// stands exactly there.
+double ReadKernel(const ResampleKernel& kernel, double position) {
+    const int32_t last = kernel.points - 1;
+    if (kernel.nearest) return kernel.table[std::clamp(TruncateToInt32(position + 0.5), 0, last)];
+    const int32_t i = std::clamp(TruncateToInt32(position), 0, last);
     const double point = kernel.table[i];
-    if (i == kernel.points - 1) return point;
-    return point + (kernel.table[i + 1] - point) * (position - i);
+    return i < last ? point + (kernel.table[i + 1] - point) * (position - i) : point;
 }
 
-// Taps of an output `frac` behind a sample.
+// Moves the kernel to an output `frac` behind a sample.
 template <class T>
-int32_t BuildResampleTaps(const ResampleKernel& kernel, double ratio, double frac, ResampleStream<T>* stream) {
+int32_t PlaceKernel(const ResampleKernel& kernel, double ratio, double frac, ResampleStream<T>* stream) {
     const KernelPhase phase = ResamplePhase(kernel, ratio, frac);
-    const int64_t taps = int64_t{phase.left} + phase.right;
-    if (taps > stream->taps_capacity) return kTooManyTaps;
-    double position = phase.first;
-    for (int64_t i = 0; i < taps; ++i, position += phase.delta) {
-        stream->taps[i] = kernel.nearest ? ReadNearest(kernel, position) : ReadInterpolated(kernel, position);
-    }
+    if (int64_t{phase.left} + phase.right > stream->taps_capacity) return kTooManyTaps;
     stream->left = phase.left;
     stream->right = phase.right;
     stream->gain = phase.delta;
     stream->frac = frac;
     return kOk;
+}
+
+// Taps of the output at which the kernel stands.
+template <class T>
+void BuildResampleTaps(const ResampleKernel& kernel, double ratio, ResampleStream<T>* stream) {
+    const KernelPhase phase = ResamplePhase(kernel, ratio, stream->frac);
+    const int64_t taps = int64_t{phase.left} + phase.right;
+    double position = phase.first;
+    for (int64_t i = 0; i < taps; ++i, position += phase.delta) stream->taps[i] = ReadKernel(kernel, position);
 }
 
 template <class T>
@@ -122,15 +125,24 @@ int32_t ResampleRun(const T* x, int32_t n, const ResampleKernel& kernel, Resampl
     double base = stream->index + stream->frac;
     if (base < 0.0) base = stream->history_count - 1;
     const double stretch = scale_kernel ? stream->ratio : std::min(stream->ratio, 1.0);
-    if (const int32_t status = BuildResampleTaps(kernel, stretch, stream->frac, stream)) return status;
+    if (const int32_t status = PlaceKernel(kernel, stretch, stream->frac, stream)) return status;
+    ResampleGroup group{kernel, stream->gain, stream->ratio, base, 0, stream->history_count, n, stream->taps_capacity};
+    bool built = false;
     while (ResampleHasRoom(n, *stream)) {
         if (*count >= capacity) return kOutputFull;
+        if (!built) BuildResampleTaps(kernel, stretch, stream);
+        built = true;
         out[(*count)++] = ResampleDot(x, *stream);
+        for (; capacity - *count >= kGroup; *count += kGroup) {
+            group.count = *count;
+            if (!ResampleTogether(group, x, out + *count)) break;
+        }
         Split next{};
         if (!SplitPosition(*count * stream->ratio + base, &next)) return kBadSelector;
         stream->index = next.index;
         if (next.frac == stream->frac) continue;
-        if (const int32_t status = BuildResampleTaps(kernel, stretch, next.frac, stream)) return status;
+        if (const int32_t status = PlaceKernel(kernel, stretch, next.frac, stream)) return status;
+        built = false;
     }
     return ResampleKeepHistory(x, n, stream);
 }
@@ -161,9 +173,10 @@ int32_t ResampleVariable(const T* x, int32_t n, double* times, int32_t count, co
         if (!SplitPosition(time, &position)) return kBadSelector;
         stream.index = position.index;
         const double ratio = adaptive ? time - last_time : 1.0;
-        if (const int32_t status = BuildResampleTaps(kernel, ratio, position.frac, &stream)) return status;
+        if (const int32_t status = PlaceKernel(kernel, ratio, position.frac, &stream)) return status;
         consumed = int64_t{stream.index} - stream.left + 1;
         if (!ResampleHasRoom(n, stream)) break;
+        BuildResampleTaps(kernel, ratio, &stream);
         last_time = time;
         out[i] = ResampleDot(x, stream);
     }

@@ -13,6 +13,7 @@
 #include "sigop/half_complex_arithmetic.h"
 #include "sigop/signals.h"
 #include "support/numbers.h"
+#include "support/vector_units.h"
 
 namespace krnumer {
 namespace {
@@ -200,10 +201,10 @@ TEST(ConvolveReal, AddsProductsInTheOrderOfTheFirstSequence) {
         std::vector<double> convolution(x.size() + y.size() - 1), correlation(convolution);
         for (size_t i = 0; i < x.size(); ++i)
             for (size_t j = 0; j < y.size(); ++j) convolution[i + j] += x[i] * y[j];
-        EXPECT_THAT(Convolution(x, y, kDirect), SameBitsAs(convolution));
+        OnEveryVectorUnit([&] { EXPECT_THAT(Convolution(x, y, kDirect), SameBitsAs(convolution)); });
         for (size_t j = 0; j < y.size(); ++j)
             for (size_t i = x.size(); i-- > 0;) correlation[j + x.size() - 1 - i] += y[j] * x[i];
-        EXPECT_THAT(Correlation(x, y, kDirect), SameBitsAs(correlation));
+        OnEveryVectorUnit([&] { EXPECT_THAT(Correlation(x, y, kDirect), SameBitsAs(correlation)); });
     }
 }
 
@@ -217,7 +218,7 @@ TEST(ConvolveComplex, AddsProductsInTheOrderOfTheLongerSequence) {
         std::vector<Complex> expected(x.size() + y.size() - 1);
         for (size_t i = 0; i < longer.size(); ++i)
             for (size_t j = 0; j < shorter.size(); ++j) expected[i + j] += longer[i] * shorter[j];
-        EXPECT_THAT(Convolution(x, y, kDirect), SameBitsAs(expected));
+        OnEveryVectorUnit([&] { EXPECT_THAT(Convolution(x, y, kDirect), SameBitsAs(expected)); });
     }
 }
 

@@ -11,6 +11,7 @@
 #include "frame/status.h"
 #include "sigop/signals.h"
 #include "support/numbers.h"
+#include "support/vector_units.h"
 
 namespace krnumer {
 namespace {
@@ -99,6 +100,50 @@ TYPED_TEST(ResampleTest, AgreesWithGoldenData) {
         const auto& spec = Reference().Reals(name + ".spec");
         Stream<T> stream(Kernel(spec[1] != 0), spec[0], spec[2]);
         EXPECT_THAT(stream.Next(Reference().Get<T>(name + ".x")), AllNear(Reference().Get<T>(name + ".y"), 0.0, 1e-13));
+    }
+}
+
+// The kernel at positions that add up, products from the last tap backwards.
+template <class T>
+std::vector<T> OneAtATime(const std::vector<T>& x, const ResampleKernel& kernel, double ratio, double start) {
+    std::vector<T> y;
+    for (;;) {
+        const double position = static_cast<double>(y.size()) * ratio + start;
+        const auto index = static_cast<int32_t>(position);
+        const KernelPhase phase = ResamplePhase(kernel, ratio, position - index);
+        if (index + phase.right >= Size(x)) return y;
+        std::vector<double> taps;
+        double place = phase.first;
+        for (int32_t t = 0; t < phase.left + phase.right; ++t, place += phase.delta) {
+            const auto point = std::min(static_cast<int32_t>(kernel.nearest ? place + 0.5 : place), kernel.points - 1);
+            double tap = kernel.table[point];
+            if (!kernel.nearest && point < kernel.points - 1) tap += (kernel.table[point + 1] - tap) * (place - point);
+            taps.push_back(tap);
+        }
+        T sum{};
+        for (int32_t t = Size(taps) - 1; t >= 0; --t) {
+            const int32_t sample = index - phase.left + 1 + t;
+            if (sample >= 0) sum += taps[Count(t)] * x[Count(sample)];
+        }
+        y.push_back(sum * phase.delta);
+    }
+}
+
+TYPED_TEST(ResampleTest, GivesWhatOneOutputAtATimeGives) {
+    using T = TypeParam;
+    for (int round = 0; round < 100; ++round) {
+        const auto table = this->random_.template Samples<double>(this->random_.Integer(1, 90));
+        const ResampleKernel kernel{table.data(), Size(table), this->random_.Integer(1, 20), round % 2 == 0};
+        // Wholes and halves meet points and ends of the table.
+        const double ratio = round % 5 == 0 ? this->random_.Integer(1, 8) * 0.5 : this->random_.Between(0.1, 5.0);
+        const double start = this->random_.Integer(0, 9) * 0.25;
+        auto x = this->random_.template Samples<T>(this->random_.Integer(0, 100));
+        if (round % 3 == 0 && !x.empty()) x.back() = x.back() * kInfinity;
+        const auto expected = OneAtATime(x, kernel, ratio, start);
+        OnEveryVectorUnit([&] {
+            ASSERT_THAT(Stream<T>(kernel, ratio, start).Next(x), SameBitsAs(expected))
+                << table.size() << " points, " << kernel.oversampling << " per sample, ratio " << ratio;
+        });
     }
 }
 
