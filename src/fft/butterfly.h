@@ -79,6 +79,13 @@ void StageOfComplex(double* re, double* im, const double* twiddle_re, const doub
 }
 
 template <int r>
-inline constexpr Butterflies kButterflies{LeafOfReal<r>, StageOfReal<r>, LeafOfComplex<r>, StageOfComplex<r>};
+void RowsOfReal(double* data, const double* twiddle_re, const double* twiddle_im, int32_t m, int32_t k) {
+    Complex t[r];
+    CombineRealRows(GeneratedKernel<r>(), t, data, {twiddle_re, twiddle_im}, 1, m, k);
+}
+
+template <int r>
+inline constexpr Butterflies kButterflies{LeafOfReal<r>, StageOfReal<r>, LeafOfComplex<r>, StageOfComplex<r>,
+                                          RowsOfReal<r>};
 
 }  // namespace krnumer

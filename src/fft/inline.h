@@ -6,8 +6,14 @@
 #define KRNUMER_FFT_INLINE __forceinline
 #define KRNUMER_FFT_INLINE_LAMBDA
 #define KRNUMER_FFT_NOINLINE __declspec(noinline)
+#define KRNUMER_FFT_UNROLL
 #else
 #define KRNUMER_FFT_INLINE inline __attribute__((always_inline))
 #define KRNUMER_FFT_INLINE_LAMBDA __attribute__((always_inline))
 #define KRNUMER_FFT_NOINLINE __attribute__((noinline))
+#if defined(__clang__)
+#define KRNUMER_FFT_UNROLL _Pragma("clang loop unroll(full)")
+#else
+#define KRNUMER_FFT_UNROLL _Pragma("GCC unroll 64")
+#endif
 #endif

@@ -62,14 +62,21 @@ KRNUMER_FFT_INLINE int32_t NyquistStep(const Kernel& kernel, Complex* t, double*
     return kOk;
 }
 
+// Combines rows of r half-complex blocks of length m in place, from row k >= 1 on. `t` holds r values.
+template <class Kernel>
+KRNUMER_FFT_INLINE int32_t CombineRealRows(const Kernel& kernel, Complex* t, double* data, Twiddles w, ptrdiff_t stride,
+                                           int32_t m, int32_t k) {
+    for (; k <= (m - 1) / 2; ++k)
+        if (const int32_t status = PairStep(kernel, t, data, w, stride, m, k)) return status;
+    return k == m / 2 ? NyquistStep(kernel, t, data, w, stride, m) : kOk;
+}
+
 // Combines r half-complex blocks of length m in place. `t` holds r values.
 template <class Kernel>
 KRNUMER_FFT_INLINE int32_t CombineReal(const Kernel& kernel, Complex* t, double* data, Twiddles w, ptrdiff_t stride,
                                        int32_t m) {
     if (const int32_t status = kernel.TransformReal(data, stride * m)) return status;
-    for (int32_t k = 1; k <= (m - 1) / 2; ++k)
-        if (const int32_t status = PairStep(kernel, t, data, w, stride, m, k)) return status;
-    return m % 2 == 0 ? NyquistStep(kernel, t, data, w, stride, m) : kOk;
+    return CombineRealRows(kernel, t, data, w, stride, m, 1);
 }
 
 // Combines r complex blocks of length m in place. `t` holds r values.

@@ -8,6 +8,7 @@
 #include <type_traits>
 
 #include "fft/rader.h"
+#include "fft/vector_transform.h"
 #include "frame/numeric.h"
 
 namespace krnumer {
@@ -72,6 +73,7 @@ void BindButterflies(qmfft_table* table) {
         table->realStage[i] = butterflies->real_stage;
         table->cplxLeaf[i] = butterflies->complex_leaf;
         table->cplxStage[i] = butterflies->complex_stage;
+        table->vectors[i] = VectorButterfliesOf(table->factors[i]);
     }
 }
 
@@ -90,6 +92,16 @@ bool BuildTwiddles(stage_tables* stage, int32_t radix, int32_t m) {
     const double delta = kTwoPi / (static_cast<double>(radix) * m);
     for (int32_t j = 1; j < radix; ++j)
         FillRotations(j * delta, stage->twiddleRe + (j - 1), stage->twiddleIm + (j - 1), m - 1, radix - 1);
+    return true;
+}
+
+bool PackTwiddles(stage_tables* stage, int32_t radix, int32_t m) {
+    if (!Allocate(&stage->packedComplex, PackedCountOfComplex(radix, m)) ||
+        !Allocate(&stage->packedReal, PackedCountOfReal(radix, m))) {
+        return false;
+    }
+    PackComplexTwiddles(stage->twiddleRe, stage->twiddleIm, radix, m, stage->packedComplex);
+    PackRealTwiddles(stage->twiddleRe, stage->twiddleIm, radix, m, stage->packedReal);
     return true;
 }
 
@@ -119,6 +131,7 @@ bool BuildStages(qmfft_table* table) {
     for (int32_t i = 0; i < table->factorCount - 1; ++i) {
         m /= table->factors[i];
         if (!BuildTwiddles(table->stages[i], table->factors[i], m)) return false;
+        if (table->vectors[i] != nullptr && !PackTwiddles(table->stages[i], table->factors[i], m)) return false;
     }
     for (int32_t i = 0; i < table->factorCount; ++i) {
         if (table->kinds[i] == kDirect && !BuildDirect(table->stages[i], table->factors[i])) return false;
@@ -135,8 +148,8 @@ void FreeStages(qmfft_table* table) {
         stage_tables* stage = table->stages[i];
         if (stage == nullptr) continue;
         ReleaseTable(stage->raderTable);
-        for (double* values :
-             {stage->dftCos, stage->dftSin, stage->twiddleRe, stage->twiddleIm, stage->raderRe, stage->raderIm}) {
+        for (double* values : {stage->dftCos, stage->dftSin, stage->twiddleRe, stage->twiddleIm, stage->raderRe,
+                               stage->raderIm, stage->packedComplex, stage->packedReal}) {
             std::free(values);
         }
         std::free(stage->raderIn);

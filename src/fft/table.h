@@ -4,6 +4,7 @@
 #include <cstdint>
 
 #include "fft/fft.h"
+#include "fft/vector_kernels.h"
 
 namespace krnumer {
 
@@ -34,6 +35,8 @@ struct Butterflies {
     RealStage real_stage;
     ComplexLeaf complex_leaf;
     ComplexStage complex_stage;
+    // What real_stage does from row k >= 1 on, at stride 1.
+    void (*real_rows)(double* data, const double* twiddle_re, const double* twiddle_im, int32_t m, int32_t k);
 };
 
 // The butterflies of a radix, null where it has none.
@@ -48,8 +51,10 @@ struct stage_tables {
     qmfft_table* raderTable;  // kRader: the table of length r-1
     double* raderRe;          // kRader: spectrum of the convolution kernel, r-1 values
     double* raderIm;
-    int32_t* raderIn;   // kRader: order in which samples are read, r entries
-    int32_t* raderOut;  // kRader: order in which they are written, r entries
+    int32_t* raderIn;       // kRader: order in which samples are read, r entries
+    int32_t* raderOut;      // kRader: order in which they are written, r entries
+    double* packedComplex;  // twiddles in the order of the vector kernels; null where there are none
+    double* packedReal;
 };
 
 }  // namespace krnumer
@@ -68,6 +73,7 @@ struct qmfft_table {
     krnumer::ComplexStage cplxStage[krnumer::kMaxFactors];
     qmfft_table* prev;
     qmfft_table* next;
+    const krnumer::VectorButterflies* vectors[krnumer::kMaxFactors];  // null where there are none
 };
 
 namespace krnumer {

@@ -2,77 +2,15 @@
 // close at hand.
 #include <cstddef>
 
-#include "fft/direct.h"
+#include "fft/factor.h"
 #include "fft/fft.h"
-#include "fft/rader.h"
 #include "fft/table.h"
+#include "fft/vector_transform.h"
 #include "frame/complex.h"
 #include "frame/status.h"
 
 namespace krnumer {
 namespace {
-
-// ---- One factor, by its kind ----
-
-int32_t RunRealLeaf(const qmfft_table* table, int32_t i, const double* in, double* out, int32_t in_stride,
-                    int32_t out_stride, int32_t how_many) {
-    const int32_t r = table->factors[i];
-    switch (table->kinds[i]) {
-        case kButterfly:
-            table->realLeaf[i](in, out, in_stride, out_stride, how_many);
-            return kOk;
-        case kDirect:
-            return DirectRealLeaf(r, *table->stages[i], in, out, in_stride, out_stride, how_many);
-        default:
-            return RaderRealLeaf(r, *table->stages[i], in, out, in_stride, out_stride, how_many);
-    }
-}
-
-int32_t RunRealStage(const qmfft_table* table, int32_t i, double* data, int32_t stride, int32_t m) {
-    const int32_t r = table->factors[i];
-    const stage_tables& stage = *table->stages[i];
-    switch (table->kinds[i]) {
-        case kButterfly:
-            table->realStage[i](data, stage.twiddleRe, stage.twiddleIm, stride, m);
-            return kOk;
-        case kDirect:
-            return DirectRealStage(r, stage, data, stride, m);
-        default:
-            return RaderRealStage(r, stage, data, stride, m);
-    }
-}
-
-int32_t RunComplexLeaf(const qmfft_table* table, int32_t i, const double* in_re, const double* in_im, double* out_re,
-                       double* out_im, int32_t in_stride, int32_t out_stride, int32_t how_many) {
-    const int32_t r = table->factors[i];
-    switch (table->kinds[i]) {
-        case kButterfly:
-            table->cplxLeaf[i](in_re, in_im, out_re, out_im, in_stride, out_stride, how_many);
-            return kOk;
-        case kDirect:
-            return DirectComplexLeaf(r, *table->stages[i], in_re, in_im, out_re, out_im, in_stride, out_stride,
-                                     how_many);
-        default:
-            return RaderComplexLeaf(r, *table->stages[i], in_re, in_im, out_re, out_im, in_stride, out_stride,
-                                    how_many);
-    }
-}
-
-int32_t RunComplexStage(const qmfft_table* table, int32_t i, double* re, double* im, int32_t stride, int32_t m) {
-    const int32_t r = table->factors[i];
-    const stage_tables& stage = *table->stages[i];
-    switch (table->kinds[i]) {
-        case kButterfly:
-            table->cplxStage[i](re, im, stage.twiddleRe, stage.twiddleIm, stride, m);
-            return kOk;
-        case kDirect:
-            return DirectComplexStage(r, stage, re, im, stride, m);
-        default:
-            return RaderComplexStage(r, stage, re, im, stride, m);
-    }
-}
-
-// ---- All factors from i on ----
 
 int32_t RealFFTStep(int32_t n, const qmfft_table* table, int32_t i, const double* in, double* out, int32_t in_stride,
                     int32_t out_stride) {
@@ -137,6 +75,8 @@ int32_t ComplexFFT(const qmfft_table* table, const double* in_re, const double* 
         *out_im = *in_im;
         return kOk;
     }
+    if (HasVectorLeaf(table) && in_im == in_re + 1 && in_stride == 2 && out_im == out_re + 1 && out_stride == 2)
+        return VectorComplexFFT(table, in_re, out_re);
     if (table->factorCount == 1)
         return RunComplexLeaf(table, 0, in_re, in_im, out_re, out_im, in_stride, out_stride, 1);
     return ComplexFFTStep(n, table, 0, in_re, in_im, out_re, out_im, in_stride, out_stride);
@@ -149,6 +89,7 @@ int32_t RealFFT(const qmfft_table* table, const double* in, double* out, int32_t
         *out = *in;
         return kOk;
     }
+    if (HasVectorLeaf(table) && in_stride == 1 && out_stride == 1) return VectorRealFFT(table, in, out);
     if (table->factorCount == 1) return RunRealLeaf(table, 0, in, out, in_stride, out_stride, 1);
     return RealFFTStep(n, table, 0, in, out, in_stride, out_stride);
 }

@@ -4,7 +4,7 @@
 extern "C" {
 
 __attribute__((visibility("default"))) const char* __asan_default_options() {
-    return "allocator_may_return_null=1:max_allocation_size_mb=4096";
+    return "allocator_may_return_null=1:max_allocation_size_mb=4096:print_suppressions=0";
 }
 
 __attribute__((visibility("default"))) const char* __tsan_default_options() {
@@ -13,10 +13,6 @@ __attribute__((visibility("default"))) const char* __tsan_default_options() {
 
 __attribute__((visibility("default"))) const char* __ubsan_default_options() {
     return "print_stacktrace=1";
-}
-
-__attribute__((visibility("default"))) const char* __lsan_default_options() {
-    return "print_suppressions=0";
 }
 
 // What the loader keeps for itself. The sanitizer knows it by its caller, unless a test's own malloc stands between.

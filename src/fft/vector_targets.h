@@ -1,0 +1,5 @@
+// The instruction sets that the vector butterflies are compiled for: the baseline of the compiler, two doubles from
+// SSSE3 on, four from AVX2, eight from AVX-512. To be included before Highway.
+#pragma once
+
+#define HWY_DISABLED_TARGETS (HWY_SSE4 | HWY_AVX3_DL | HWY_SVE | HWY_SVE2 | HWY_SVE_256 | HWY_SVE2_128 | HWY_RVV)

@@ -1,0 +1,195 @@
+#include "fft/vector_transform.h"
+
+#include <algorithm>
+#include <type_traits>
+
+#include "fft/factor.h"
+#include "frame/complex.h"
+#include "frame/numeric.h"
+#include "frame/status.h"
+
+namespace krnumer {
+namespace {
+
+// Columns that are taken together: a cache line of neighbouring samples at least, so that lines are used whole however
+// far apart the samples of one column are.
+template <class T>
+constexpr int32_t kGroup = 64 / sizeof(T);
+
+constexpr int32_t kMostTogether = 32;
+
+// Data up to this size stay in the second-level cache between the passes, and no pass needs to be cut into blocks.
+constexpr size_t kCachedBytes = 512 * 1024;
+
+void RunColumns(const qmfft_table* table, int32_t i, const Complex* in, ptrdiff_t step, Complex* out,
+                const ptrdiff_t* places, int32_t lanes) {
+    table->vectors[i]->complex.columns(in, step, out, places, lanes);
+}
+
+void RunColumns(const qmfft_table* table, int32_t i, const double* in, ptrdiff_t step, double* out,
+                const ptrdiff_t* places, int32_t lanes) {
+    int32_t l = table->vectors[i]->real.columns(in, step, out, places, lanes);
+    for (; l < lanes; ++l) table->realLeaf[i](in + l, out + places[l], static_cast<int32_t>(step), 1, 1);
+}
+
+int32_t RunStage(const qmfft_table* table, int32_t i, Complex* data, int32_t m) {
+    return RunComplexStage(table, i, &data->re, &data->im, 2, m);
+}
+
+int32_t RunStage(const qmfft_table* table, int32_t i, double* data, int32_t m) {
+    return RunRealStage(table, i, data, 1, m);
+}
+
+// Where the sub-sequences of the first `depth` factors have their results, in the order of their first samples.
+class Places {
+  public:
+    Places(const qmfft_table* table, int32_t depth) : table_(table) {
+        int32_t length = table->length;
+        for (int32_t i = 0; i < depth; ++i) {
+            length /= table->factors[i];
+            step_[i] = length;
+            digit_[i] = 0;
+        }
+        step_[depth] = 0;
+        digit_[depth] = 0;
+    }
+
+    ptrdiff_t Next() {
+        const ptrdiff_t place = place_;
+        place_ += step_[0];
+        for (int32_t i = 0; ++digit_[i] == table_->factors[i]; ++i) {
+            digit_[i] = 0;
+            place_ += step_[i + 1] - step_[i] * table_->factors[i];
+        }
+        return place;
+    }
+
+  private:
+    const qmfft_table* table_;
+    ptrdiff_t place_ = 0;
+    ptrdiff_t step_[kMaxFactors + 1];
+    int32_t digit_[kMaxFactors + 1];
+};
+
+// The factors from i on, of `lanes` neighbouring sub-sequences of length n; their samples are `step` apart.
+template <class T>
+int32_t TransformLanes(const qmfft_table* table, int32_t i, int32_t n, const T* in, ptrdiff_t step, T* out,
+                       const ptrdiff_t* places, int32_t lanes) {
+    const int32_t r = table->factors[i];
+    if (i == table->factorCount - 1) {
+        RunColumns(table, i, in, step, out, places, lanes);
+        return kOk;
+    }
+    const int32_t m = n / r;
+    for (int32_t b = 0; b < r; ++b) {
+        if (const int32_t status =
+                TransformLanes(table, i + 1, m, in + b * step, r * step, out + ptrdiff_t{b} * m, places, lanes)) {
+            return status;
+        }
+    }
+    for (int32_t l = 0; l < lanes; ++l)
+        if (const int32_t status = RunStage(table, i, out + places[l], m)) return status;
+    return kOk;
+}
+
+// The first `depth` factors are gone through in passes over all data, those behind them depth first.
+template <class T>
+int32_t Transform(const qmfft_table* table, const T* in, T* out) {
+    const int32_t n = table->length;
+    const int32_t last = table->factorCount - 1;
+    if (last == 0) {
+        const ptrdiff_t place = 0;
+        RunColumns(table, 0, in, 1, out, &place, 1);
+        return kOk;
+    }
+    const bool cached = Count(n) * sizeof(T) <= kCachedBytes;
+    int32_t depth = 0;
+    int32_t sequences = 1;
+    while (depth < last && (cached || sequences < kGroup<T>)) sequences *= table->factors[depth++];
+
+    const int32_t together = cached ? kMostTogether : kGroup<T>;
+    Places next(table, depth);
+    for (int32_t start = 0; start < sequences; start += together) {
+        const int32_t lanes = std::min(together, sequences - start);
+        ptrdiff_t places[kMostTogether];
+        for (int32_t l = 0; l < lanes; ++l) places[l] = next.Next();
+        if (const int32_t status =
+                TransformLanes(table, depth, n / sequences, in + start, sequences, out, places, lanes)) {
+            return status;
+        }
+    }
+    int32_t length = n / sequences;
+    for (int32_t i = depth; i-- > 0;) {
+        const int32_t m = length;
+        length *= table->factors[i];
+        for (int32_t start = 0; start < n; start += length)
+            if (const int32_t status = RunStage(table, i, out + start, m)) return status;
+    }
+    return kOk;
+}
+
+// Vectors of `lanes` rows from row `first` up to before row `end`.
+int32_t VectorCount(int32_t first, int32_t end, int32_t lanes) {
+    return (end - first + lanes - 1) / lanes;
+}
+
+// Calls store(vector, column j, lane, w) for all that is packed.
+template <class Store>
+void ForEachTwiddle(const double* re, const double* im, int32_t radix, int32_t first, int32_t end, int32_t lanes,
+                    Store store) {
+    const ptrdiff_t columns = radix - 1;
+    const int32_t vectors = VectorCount(first, end, lanes);
+    for (int32_t v = 0; v < vectors; ++v) {
+        for (ptrdiff_t j = 0; j < columns; ++j) {
+            for (int32_t l = 0; l < lanes; ++l) {
+                const ptrdiff_t k = first + ptrdiff_t{v} * lanes + l;
+                const ptrdiff_t at = (k - 1) * columns + j;
+                store(v * columns + j, l, k > 0 && k < end ? Complex{re[at], im[at]} : Complex{1.0, 0.0});
+            }
+        }
+    }
+}
+
+}  // namespace
+
+bool HasVectorLeaf(const qmfft_table* table) {
+    return table->vectors[table->factorCount - 1] != nullptr;
+}
+
+int32_t VectorComplexFFT(const qmfft_table* table, const double* in, double* out) {
+    return Transform(table, reinterpret_cast<const Complex*>(in), reinterpret_cast<Complex*>(out));
+}
+
+int32_t VectorRealFFT(const qmfft_table* table, const double* in, double* out) {
+    return Transform(table, in, out);
+}
+
+size_t PackedCountOfComplex(int32_t radix, int32_t m) {
+    const int32_t lanes = VectorLanes();
+    return Count(VectorCount(0, m, lanes / 2)) * Count(radix - 1) * Count(lanes);
+}
+
+void PackComplexTwiddles(const double* re, const double* im, int32_t radix, int32_t m, double* packed) {
+    const int32_t lanes = VectorLanes();
+    ForEachTwiddle(re, im, radix, 0, m, lanes / 2, [&](ptrdiff_t vector, int32_t lane, Complex w) {
+        double* at = packed + vector * lanes + 2 * lane;
+        at[0] = w.re;
+        at[1] = w.im;
+    });
+}
+
+size_t PackedCountOfReal(int32_t radix, int32_t m) {
+    const int32_t lanes = VectorLanes();
+    return Count(VectorCount(1, m / 2 + 1, lanes)) * Count(radix - 1) * Count(2 * lanes);
+}
+
+void PackRealTwiddles(const double* re, const double* im, int32_t radix, int32_t m, double* packed) {
+    const int32_t lanes = VectorLanes();
+    ForEachTwiddle(re, im, radix, 1, m / 2 + 1, lanes, [&](ptrdiff_t vector, int32_t lane, Complex w) {
+        double* at = packed + vector * 2 * lanes + lane;
+        at[0] = w.re;
+        at[lanes] = w.im;
+    });
+}
+
+}  // namespace krnumer
