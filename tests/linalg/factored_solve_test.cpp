@@ -13,13 +13,6 @@ namespace {
 
 using testing::ElementsAre;
 
-// Pivots as LU_head delivers them: integers in the first half of an array of doubles.
-HostArray<double> Pivots(const std::vector<int32_t>& rows) {
-    std::vector<double> places(rows.size());
-    if (!rows.empty()) std::memcpy(places.data(), rows.data(), rows.size() * sizeof(int32_t));
-    return HostArray<double>(places);
-}
-
 template <class T>
 class FactoredSolve : public testing::Test {
   protected:

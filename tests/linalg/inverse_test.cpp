@@ -12,14 +12,6 @@
 namespace krnumer {
 namespace {
 
-using testing::ElementsAre;
-
-HostArray<double> Pivots(const std::vector<int32_t>& rows) {
-    std::vector<double> places(rows.size());
-    std::memcpy(places.data(), rows.data(), rows.size() * sizeof(int32_t));
-    return HostArray<double>(places);
-}
-
 template <class T>
 class Inverse : public testing::Test {
   protected:

@@ -3,6 +3,7 @@
 #pragma once
 
 #include <cstdint>
+#include <cstring>
 #include <functional>
 #include <vector>
 
@@ -75,6 +76,13 @@ std::vector<MatrixKind<T>> MatrixKinds() {
         {"large", scaled(1e100)},
         {"small", scaled(1e-100)},
     };
+}
+
+// Pivots as LU_head delivers them: integers in the first half of an array of doubles.
+inline HostArray<double> Pivots(const std::vector<int32_t>& rows) {
+    std::vector<double> places(rows.size());
+    if (!rows.empty()) std::memcpy(places.data(), rows.data(), rows.size() * sizeof(int32_t));
+    return HostArray<double>(places);
 }
 
 using ElementTypes = testing::Types<double, Complex>;
