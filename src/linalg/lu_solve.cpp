@@ -1,6 +1,7 @@
 #include "linalg/lu_solve.h"
 
 #include <algorithm>
+#include <cstddef>
 #include <functional>
 #include <utility>
 
@@ -10,6 +11,7 @@
 #include "linalg/element.h"
 #include "linalg/factor_kernels.h"
 #include "linalg/lu.h"
+#include "linalg/row_sums.h"
 
 namespace krnumer {
 namespace {
@@ -22,14 +24,9 @@ void SolveUnitLower(const T* lu, size_t n, T* x) {
     for (size_t first = 0; first < n; first += kTogether) {
         const size_t count = std::min(kTogether, n - first);
         const T* const rows = lu + first * n;
-        T sums[kTogether]{};
-        if (count == kTogether) {
-            for (size_t j = 0; j < first; ++j)
-                for (size_t row = 0; row < kTogether; ++row) sums[row] += rows[row * n + j] * x[j];
-        } else {
-            for (size_t row = 0; row < count; ++row)
-                for (size_t j = 0; j < first; ++j) sums[row] += rows[row * n + j] * x[j];
-        }
+        T sums[kTogether];
+        ForEachRowSum(rows, static_cast<std::ptrdiff_t>(n), static_cast<std::ptrdiff_t>(count),
+                      static_cast<std::ptrdiff_t>(first), x, [&sums](std::ptrdiff_t row, T sum) { sums[row] = sum; });
         for (size_t row = 0; row < count; ++row) {
             for (size_t j = first; j < first + row; ++j) sums[row] += rows[row * n + j] * x[j];
             x[first + row] -= sums[row];

@@ -42,7 +42,13 @@ void BackwardAdjoint(const T* lower, size_t n, T* x, size_t count) {
     for (size_t j = n; j-- > 0;) {
         const T* const column = lower + (LowerDiagonal(j, n) - j);
         T* const row = x + j * count;
-        for (size_t i = j + 1; i < n; ++i) SubtractMultiple(Conjugate(column[i]), x + i * count, count, row);
+        if (count == 1) {
+            T rest = *row;
+            for (size_t i = j + 1; i < n; ++i) rest -= Conjugate(column[i]) * x[i];
+            *row = rest;
+        } else {
+            for (size_t i = j + 1; i < n; ++i) SubtractMultiple(Conjugate(column[i]), x + i * count, count, row);
+        }
         DivideRow(row, count, Conjugate(column[j]));
     }
 }

@@ -11,7 +11,6 @@
 namespace krnumer {
 namespace {
 
-
 template <class T>
 bool IsUpperTrapezoidal(const Matrix<T>& r) {
     for (int32_t i = 0; i < r.rows; ++i)

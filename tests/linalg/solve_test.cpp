@@ -147,6 +147,16 @@ TYPED_TEST(Solve, SvdOfZerosIsZeroOrUnknown) {
     for (const T x : this->x_.values()) EXPECT_TRUE(std::isnan(RealPart(x)));
 }
 
+// The iteration splits by an absolute band around the norm. In a matrix far below it everything off the diagonal of the
+// bidiagonal form counts as zero, and another system is solved.
+TYPED_TEST(Solve, SvdLosesTinyMatrices) {
+    using T = TypeParam;
+    const auto tiny = [this](double x) { return this->R(1e-20 * x); };
+    const Matrix<T> a(2, 2, {tiny(1), tiny(2), tiny(3), tiny(4)});
+    EXPECT_EQ(this->One(this->Svd, a, {tiny(5), tiny(11)}), kOk);
+    EXPECT_THAT(this->x_.values(), AllNear(std::vector<T>{this->R(3.8), this->R(2)}, 1e-14));
+}
+
 TYPED_TEST(Solve, SvdChecksItsArguments) {
     using T = TypeParam;
     const HostArray<T> none, two(2), three(3);
