@@ -140,16 +140,19 @@ TYPED_TEST(LapackRoute, StartsNoThread) {
     EXPECT_EQ(RunningThreads(), 1);
 }
 
+// Many short calls: what goes wrong, if it does, goes wrong where work buffers are given out.
 TYPED_TEST(LapackRoute, ServesSeveralThreadsAtOnce) {
-    const auto a = IntegerMatrix<TypeParam>(kSize, 6), b = IntegerMatrix<TypeParam>(kSize, 7);
-    const auto right = ProductByDefinition(a, b, kSize);
+    constexpr int32_t kShort = 48;
+    constexpr int kRounds = 2000;
+    const auto a = IntegerMatrix<TypeParam>(kShort, 6), b = IntegerMatrix<TypeParam>(kShort, 7);
+    const auto right = ProductByDefinition(a, b, kShort);
     constexpr std::size_t kThreads = 8;
     std::vector<int> wrong(kThreads, 0);
     {
         std::vector<std::jthread> threads;
         for (std::size_t thread = 0; thread < kThreads; ++thread) {
             threads.emplace_back([&, thread] {
-                for (int round = 0; round < 25; ++round) wrong[thread] += Product(a, b, kSize) != right;
+                for (int round = 0; round < kRounds; ++round) wrong[thread] += Product(a, b, kShort) != right;
             });
         }
     }
