@@ -45,8 +45,8 @@ KRNUMER_API int32_t CxChirpZT_head(KrHandle x, const KrComplex* a, const KrCompl
  * @param[in]  m  number of samples, at most the number of values; not positive for as many
  * @param[out] y  samples
  * @return        0; -20003 when `x` is empty; -20008 when `m` is more than the values; -20001 without memory or when
- * `y` cannot be sized; -20068 when A, and then W, is not finite; -20141 when its squared modulus is 0; -20060 when
- * points of the spiral coincide
+ * `y` cannot be sized; -20068 when A, and then W, is not finite; -20141 when its squared modulus is 0, or that of
+ * 1/W; -20060 when points of the spiral coincide
  */
 KRNUMER_API int32_t InvChirpZT_head(KrHandle x, const KrComplex* a, const KrComplex* w, int32_t m, KrHandle y);
 

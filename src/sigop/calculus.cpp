@@ -32,7 +32,7 @@ int32_t Integrate(double* x, int32_t n, double initial, double final, double dt)
     if (n < 1) return kEmptyInput;
     if (dt <= 0.0) return kBadSamplingInterval;
     const double sixth = dt * 0.16666666666666666;
-    double integral = 0.0;
+    double integral = -0.0;  // leaves the first term as it is, whatever its sign
     ForEachNeighbourhood(x, n, initial, final, [&](double previous, double sample, double next) {
         return integral += (previous + 4.0 * sample + next) * sixth;
     });

@@ -76,13 +76,18 @@ int32_t Autocorrelate(const double* x, int32_t nx, double* z) {
     return kOk;
 }
 
+// Sums of real data follow y; of complex data y is the second factor, and the kernel where the lengths are equal.
 template <class T>
 int32_t ConvolveReversed(const T* x, int32_t nx, const T* y, int32_t ny, int32_t algorithm, T* z) {
     if (nx < 1 || ny < 1) return kEmptyInput;
     Scratch<T> reversed(Count(nx));
     if (!reversed) return kOutOfMemory;
     CopyReversed(x, Count(nx), reversed.data());
-    return Convolve(y, ny, reversed.data(), nx, algorithm, z);
+    if constexpr (std::is_same_v<T, double>) {
+        return Convolve(y, ny, reversed.data(), nx, algorithm, z);
+    } else {
+        return Convolve(reversed.data(), nx, y, ny, algorithm, z);
+    }
 }
 
 bool IsNormalization(int32_t normalization) {

@@ -2,6 +2,8 @@
 
 #include <cmath>
 
+#include "frame/numeric.h"
+
 namespace krnumer {
 namespace {
 
@@ -26,7 +28,7 @@ class Slots {
 
 void FindTriggers(const double* x, int32_t channels, int32_t n, const Triggers& triggers, const TriggerHits& hits) {
     Slots slots(hits.found);
-    for (int32_t r = 0; r<channels; ++r, x += n> 0 ? n : 0) {
+    for (int32_t r = 0; r < channels; ++r, x += Count(n)) {
         const double level = triggers.levels[r];
         const double hysteresis = std::fabs(triggers.hysteresis[r]);
         const double low = level - hysteresis;

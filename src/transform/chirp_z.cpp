@@ -117,10 +117,9 @@ int32_t WindowStart(Complex b, Complex w, int32_t n, int32_t m) {
 template <class T>
 int32_t ChirpZ(const T* x, int32_t n, Complex a, Complex w, int32_t m, int32_t algorithm, Complex* y) {
     if (n < 1) return kEmptyInput;
-    const auto chosen = ChirpZAlgorithm{algorithm};
-    if (chosen != ChirpZAlgorithm::kDirect && chosen != ChirpZAlgorithm::kFrequencyDomain) return kBadSelector;
+    if (algorithm != kDirect && algorithm != kFrequencyDomain) return kBadSelector;
     if (const int32_t status = CheckSpiral(a, w)) return status;
-    return chosen == ChirpZAlgorithm::kDirect ? DirectChirpZ(x, n, a, w, m, y) : BluesteinChirpZ(x, n, a, w, m, y);
+    return algorithm == kDirect ? DirectChirpZ(x, n, a, w, m, y) : BluesteinChirpZ(x, n, a, w, m, y);
 }
 
 template int32_t ChirpZ(const double*, int32_t, Complex, Complex, int32_t, int32_t, Complex*);
@@ -185,7 +184,7 @@ int32_t InverseChirpZ(const Complex* x, int32_t n, Complex a, Complex w, int32_t
 
     Complex w_inverse;
     if (const int32_t status = Reciprocal(w, &w_inverse)) return status;
-    if (const int32_t status = DirectChirpZ(q, m, kOne, w_inverse, m, r)) return status;
+    if (const int32_t status = ChirpZ(q, m, kOne, w_inverse, m, kDirect, r)) return status;
 
     Complex b_inverse;
     if (const int32_t status = Reciprocal(b, &b_inverse)) return status;

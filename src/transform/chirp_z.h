@@ -8,18 +8,16 @@
 
 namespace krnumer {
 
-enum class ChirpZAlgorithm : int32_t { kDirect = 0, kFrequencyDomain = 1 };
-
 // m values of the transform of n samples. kEmptyInput where n < 1, kBadSelector, then for A and after it for W
-// kNotFinite and kZeroParameter. The direct sum takes a power of W for every term; the other is a convolution with a
-// chirp (L. I. Bluestein, IEEE Trans. AU 18, 451, 1970).
+// kNotFinite and kZeroParameter. `algorithm` is a ConvolutionAlgorithm. The direct sum takes a power of W for every
+// term; the other is a convolution with a chirp (L. I. Bluestein, IEEE Trans. AU 18, 451, 1970).
 template <class T>
 int32_t ChirpZ(const T* x, int32_t n, Complex a, Complex w, int32_t m, int32_t algorithm, Complex* y);
 
 // The m samples whose transform passes through m of the n values x, those nearest the unit circle, by the explicit
 // inverse of the Vandermonde matrix of a geometric sequence, in O(m^2) steps. Where |A| or |W| is not 1 its condition
-// grows like a power of m. kEmptyInput, kNotFinite and kZeroParameter for A and W, kBadDimension where m > n, kZeroBase
-// where two points of the spiral coincide.
+// grows like a power of m. kEmptyInput, kNotFinite and kZeroParameter for A, W and 1/W, kBadDimension where m > n,
+// kZeroBase where two points of the spiral coincide.
 int32_t InverseChirpZ(const Complex* x, int32_t n, Complex a, Complex w, int32_t m, Complex* y);
 
 // Coefficients c[0..m) of the monic polynomial of m roots, the highest left out. The roots are put in Leja order first,

@@ -59,6 +59,13 @@ TEST_F(CalculusExports, ASingleSampleTakesBothEnds) {
     EXPECT_THAT(x.values(), AllNear({28.0 / 6}, 1e-15));
 }
 
+TEST_F(CalculusExports, TheIntegralOfNegativeZeroIsNegativeZero) {
+    x_ = HostArray<double>{-0.0, -0.0};
+    initial_ = final_ = -0.0;
+    EXPECT_EQ(Integral(x_.handle(), &initial_, &final_, &dt_, &err_), 0);
+    for (const double value : x_.values()) EXPECT_TRUE(std::signbit(value));
+}
+
 TEST_F(CalculusExports, RefuseTheIntervalOrTheEmptyInputFirst) {
     for (const double dt : {0.0, -1.0, -kInfinity}) {
         dt_ = dt;

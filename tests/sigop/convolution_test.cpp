@@ -222,6 +222,18 @@ TEST(ConvolveComplex, AddsProductsInTheOrderOfTheLongerSequence) {
     }
 }
 
+TEST(CorrelateComplex, AddsProductsInTheOrderOfTheLongerOrReversedSequence) {
+    RandomSignals random;
+    for (int round = 0; round < 60; ++round) {
+        const int32_t nx = random.Integer(1, 60);
+        const auto x = random.Samples<Complex>(nx);
+        const auto y = random.Samples<Complex>(round % 2 == 0 ? nx : random.Integer(1, 60));
+        std::vector<Complex> reversed(x.rbegin(), x.rend());
+        for (Complex& value : reversed) value = Conjugate(value);
+        EXPECT_THAT(Correlation(x, y, kDirect), SameBitsAs(Convolution(reversed, y, kDirect)));
+    }
+}
+
 // A product that is not part of an output must not reach it, not even times zero.
 TYPED_TEST(ConvolutionTest, AnInfinityReachesOnlyTheOutputsItBelongsTo) {
     using T = TypeParam;

@@ -175,6 +175,15 @@ TEST_F(ChirpTransforms, CannotBeInvertedWherePointsCoincide) {
     ExpectEmptied();
 }
 
+TEST_F(ChirpTransforms, CannotBeInvertedWhereTheReciprocalOfTheRatioVanishes) {
+    const KrComplex one{1, 0};
+    const KrComplex huge{1e200, 0};
+    for (const int32_t n : {1, 3}) {
+        EXPECT_EQ(InvChirpZT_head(HostArray<Complex>(n).handle(), &one, &huge, 0, y_.handle()), kZeroParameter);
+        ExpectEmptied();
+    }
+}
+
 TEST_F(ChirpTransforms, ReportARefusedSize) {
     const KrComplex one{1, 0};
     HostArray<double> x{1, 2};
