@@ -157,8 +157,8 @@ KRNUMER_API int32_t Correlation_2DH(KrHandle x, KrHandle y, KrHandle z, int32_t 
 KRNUMER_API int32_t CxCorrelation_2DH(KrHandle x, KrHandle y, KrHandle z, int32_t algorithm);
 
 /* ---- Changes of the sampling rate. Streams keep what they need between blocks in arguments of the caller's, so that
- *      the blocks of a signal, however cut, give what the whole would give. -----------------------------------------
- */
+ *      the blocks of a signal, however cut, give what the whole would give; at ratios that are not rational, up to
+ *      the rounding of positions. --------------------------------------------------------------------------------- */
 
 /**
  * Decimation of a block: every factor-th sample, or the means of blocks of `factor` samples. What is left at the end is
@@ -183,7 +183,7 @@ KRNUMER_API int32_t CxDecimate_H(KrHandle x, int32_t factor, int32_t averaging);
  * @param[in]     factor        from 1 on
  * @param[in]     averaging     0 to keep every factor-th sample, else means of `factor` samples
  * @param[in,out] start         samples to pass over until the next sample that is kept, or until the next mean begins
- * or is complete; 0 to begin with
+ *                              or is complete; 0 to begin with
  * @param[in]     reset         other than 0 forgets `partialCount` and `partialSum`, not `start`
  * @param[in,out] partialCount  samples in a mean that is not complete
  * @param[in,out] partialSum    their sum
@@ -313,7 +313,8 @@ KRNUMER_API int32_t CxResample_Const(KrHandle x, KrResampleState* state, const K
  * @param[out]    outCount  number of outputs; 0 on failure
  * @param[out]    consumed  samples that the caller takes off the front of `x` for the next call; 0 on failure
  * @return                  0, always without `times`; -20140 when the oversampling is below 1; -20003 when the kernel
- * is empty; -20061 when a position does not fit 32 bits; -20001 without memory. A failure empties `times`.
+ *                          is empty; -20061 when a position does not fit 32 bits; -20001 without memory. A failure
+ *                          empties `times`.
  */
 KRNUMER_API int32_t Resample_Variable(KrHandle x, KrHandle times, const KrVariableResampleSpec* spec, double* lastTime,
                                       int32_t* outCount, int32_t* consumed);
@@ -333,8 +334,7 @@ KRNUMER_API int32_t Resample_Variable(KrHandle x, KrHandle times, const KrVariab
 KRNUMER_API int32_t CxResample_Variable(KrHandle x, KrHandle times, const KrVariableResampleSpec* spec, KrHandle y,
                                         double* lastTime, int32_t* outCount, int32_t* consumed);
 
-/* ---- Samples in the time domain ----------------------------------------------------------------------------------
- */
+/* ---- Samples in the time domain ---------------------------------------------------------------------------------- */
 
 /**
  * Derivative by central differences, y[i] = (x[i+1] - x[i-1]) / (2 dt).

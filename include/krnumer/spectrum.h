@@ -9,8 +9,7 @@
 #include <krnumer/types.h>
 
 /* ---- Spectra: two-sided, all n lines filled, scaled by 1/n^2, so that a constant v has v^2 at DC at any length. A
- * single sample is its own line.
- * ---------------------------------------------------------------------------------------- */
+ *      single sample is its own line. ----------------------------------------------------------------------------- */
 
 /**
  * Power spectrum of real samples, |X[k]|^2 / n^2, in place.
@@ -39,17 +38,16 @@ KRNUMER_API int32_t CxSpectrumH(KrHandle x, KrHandle y, void** slot);
  * @param[out]    z     spectrum, 1-D complex double; emptied on failure
  * @param[in,out] slot  table slot; not bound when `z` cannot be sized
  * @return              0; -20003 when `x` or `y` is empty; -20002 when they differ in length; -20001 without memory or
- * a table, or when `z` cannot be sized
+ *                      a table, or when `z` cannot be sized
  */
 KRNUMER_API int32_t CrossSpectrumH(KrHandle x, KrHandle y, KrHandle z, void** slot);
 
 /** CrossSpectrumH of complex samples, 1-D complex double. */
 KRNUMER_API int32_t CxCrossSpectrumH(KrHandle x, KrHandle y, KrHandle z, void** slot);
 
-/* ---- Moving sums and modulators. All state is the caller's, so a signal can come in blocks of any size. They return 0
- *      whenever an aligned copy of an array, where one is needed, can be had, and -20001, with the arrays emptied,
- * where it cannot.
- * ------------------------------------------------------------------------------------------------------- */
+/* ---- Moving sums and modulators. All state is the caller's, so that a signal can come in blocks of any size. They
+ *      return 0 whenever an aligned copy of an array, where one is needed, can be had, and -20001, with the arrays
+ *      emptied, where it cannot. ---------------------------------------------------------------------------------- */
 
 /**
  * Cascade of moving sums of one width, in place: after C stages the gain is w^C.

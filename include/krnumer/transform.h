@@ -7,8 +7,8 @@
  *
  *     cosine transform (type II, orthonormal)   y[k] = s(k) sum of x[i] cos(pi (2i+1) k / (2n)), s(0) = sqrt(1/n), else
  *                                               s(k) = sqrt(2/n)
- *     sine transform (type I, unnormalised)     y[k] = sum of x[i] sin(pi (i+1)(k+1) / (n+1)); its inverse has the
- * factor 2 / (n+1)
+ *     sine transform (type I, unnormalised)     y[k] = sum of x[i] sin(pi (i+1)(k+1) / (n+1)); inverse with the
+ *                                               factor 2 / (n+1)
  *
  * Cosine transforms of even length reorder their input (J. Makhoul, IEEE Trans. ASSP 28, 27, 1980); those of odd length
  * work on its even extension and take about twice the time.
@@ -24,7 +24,7 @@
  * @param[in]     x     samples, 1-D
  * @param[out]    y     transform, 1-D of `size`; left as it is when it cannot be sized
  * @param[in]     size  length of the transform: samples beyond it are left out, missing ones are 0; not positive for
- * the length of `x`
+ *                      the length of `x`
  * @param[in,out] slot  table slot
  * @return              0; -20003 when `x` is empty; -20001 without memory or a table, or when `y` cannot be sized
  */
@@ -36,7 +36,7 @@ KRNUMER_API int32_t DCT_1DH(KrHandle x, KrHandle y, int32_t size, void** slot);
  * @param[in]     x     samples, 1-D
  * @param[out]    y     transform, 1-D of `size`; left as it is when it cannot be sized
  * @param[in]     size  length of the transform: samples beyond it are left out, missing ones are 0; not positive for
- * the length of `x`
+ *                      the length of `x`
  * @param[in,out] slot  table slot
  * @return              0; -20003 when `x` is empty; -20001 without memory or a table, or when `y` cannot be sized
  */
@@ -68,12 +68,12 @@ KRNUMER_API int32_t InvDST_1DH(KrHandle x, KrHandle y, void** slot);
  * @param[in]     x         samples, 2-D
  * @param[out]    y         transform, 2-D of `rows` by `cols`
  * @param[in]     rows      rows of the transform: what lies beyond is left out, what is missing is 0; not positive for
- * the rows of `x`
+ *                          the rows of `x`
  * @param[in]     cols      columns of the transform, likewise
  * @param[in,out] slotRows  table slot for the number of rows
  * @param[in,out] slotCols  table slot for the number of columns
  * @return                  0; -20003 when `x` has no row or no column; -20001 without memory or a table, or when `y`
- * cannot be sized
+ *                          cannot be sized
  */
 KRNUMER_API int32_t DCT_2DH(KrHandle x, KrHandle y, int32_t rows, int32_t cols, void** slotRows, void** slotCols);
 
@@ -83,12 +83,12 @@ KRNUMER_API int32_t DCT_2DH(KrHandle x, KrHandle y, int32_t rows, int32_t cols, 
  * @param[in]     x         samples, 2-D
  * @param[out]    y         transform, 2-D of `rows` by `cols`
  * @param[in]     rows      rows of the transform: what lies beyond is left out, what is missing is 0; not positive for
- * the rows of `x`
+ *                          the rows of `x`
  * @param[in]     cols      columns of the transform, likewise
  * @param[in,out] slotRows  table slot for the number of rows
  * @param[in,out] slotCols  table slot for the number of columns
  * @return                  0; -20003 when `x` has no row or no column; -20001 without memory or a table, or when `y`
- * cannot be sized
+ *                          cannot be sized
  */
 KRNUMER_API int32_t DST_2DH(KrHandle x, KrHandle y, int32_t rows, int32_t cols, void** slotRows, void** slotCols);
 
@@ -100,7 +100,7 @@ KRNUMER_API int32_t DST_2DH(KrHandle x, KrHandle y, int32_t rows, int32_t cols, 
  * @param[in,out] slotRows  table slot for the number of rows
  * @param[in,out] slotCols  table slot for the number of columns
  * @return                  0; -20003 when `x` has no row or no column; -20001 without memory or a table, or when `y`
- * cannot be sized
+ *                          cannot be sized
  */
 KRNUMER_API int32_t InvDCT_2DH(KrHandle x, KrHandle y, void** slotRows, void** slotCols);
 
@@ -112,7 +112,7 @@ KRNUMER_API int32_t InvDCT_2DH(KrHandle x, KrHandle y, void** slotRows, void** s
  * @param[in,out] slotRows  table slot for the number of rows
  * @param[in,out] slotCols  table slot for the number of columns
  * @return                  0; -20003 when `x` has no row or no column; -20001 without memory or a table, or when `y`
- * cannot be sized
+ *                          cannot be sized
  */
 KRNUMER_API int32_t InvDST_2DH(KrHandle x, KrHandle y, void** slotRows, void** slotCols);
 

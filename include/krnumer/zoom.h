@@ -24,7 +24,7 @@
  * @param[out] y          values
  * @return                0; -20003 when `x` is empty; -20061 for another `algorithm`; -20001 without memory or when `y`
  *                        cannot be sized; -20068 when A, and then W, is not finite (the largest double counts as
- * infinite); -20141 when its squared modulus is 0
+ *                        infinite); -20141 when its squared modulus is 0
  */
 KRNUMER_API int32_t ChirpZT_head(KrHandle x, const KrComplex* a, const KrComplex* w, int32_t m, int32_t algorithm,
                                  KrHandle y);
@@ -45,8 +45,8 @@ KRNUMER_API int32_t CxChirpZT_head(KrHandle x, const KrComplex* a, const KrCompl
  * @param[in]  m  number of samples, at most the number of values; not positive for as many
  * @param[out] y  samples
  * @return        0; -20003 when `x` is empty; -20008 when `m` is more than the values; -20001 without memory or when
- * `y` cannot be sized; -20068 when A, and then W, is not finite; -20141 when its squared modulus is 0, or that of
- * 1/W; -20060 when points of the spiral coincide
+ *                `y` cannot be sized; -20068 when A, and then W, is not finite; -20141 when its squared modulus is 0,
+ *                or that of 1/W; -20060 when points of the spiral coincide
  */
 KRNUMER_API int32_t InvChirpZT_head(KrHandle x, const KrComplex* a, const KrComplex* w, int32_t m, KrHandle y);
 
@@ -66,7 +66,7 @@ KRNUMER_API int32_t InvChirpZT_head(KrHandle x, const KrComplex* a, const KrComp
  * @param[in,out] slot   table slot for length k, see krnumer/fft.h
  * @return               0, also where `x` is empty; -20021 when `p` is less than 1; -20115 when `count` is less than 1;
  *                       -20001 without memory or a table, so also when `k` is less than 1; the host's status when `y`
- * cannot be sized
+ *                       cannot be sized
  */
 KRNUMER_API int32_t CxDZTH(KrHandle x, int32_t p, int32_t k, int32_t start, int32_t count, KrHandle y, void** slot);
 

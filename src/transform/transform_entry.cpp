@@ -14,7 +14,6 @@ namespace {
 enum class Refused { kLeavesOutput, kEmptiesOutput };
 
 // A line of `size` samples, or of the length of X where that is not positive.
-
 int32_t TransformLine(KrHandle x, KrHandle y, int32_t size, void** slot, const LineTransform& line, Refused refused) {
     ByValue call;
     In<double> samples(call, x);
