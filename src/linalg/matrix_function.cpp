@@ -223,7 +223,7 @@ int32_t CxLnCore(Complex* a, int32_t n) {
     const double scale = LargestModulus(a, count) + LargestModulus(other, count);
     double difference = 0.0;
     for (std::size_t i = 0; i < count; ++i) difference = std::max(difference, Modulus(a[i] - other[i]));
-    bool converged = difference / scale < 1e-12;
+    bool converged = !HasUnusable(other, count) && difference / scale < 1e-12;
     if (!converged) {
         std::copy_n(a, count, other);
         Perturb(other, n);

@@ -100,6 +100,15 @@ TEST_F(MatrixFunctions, LogarithmOfADefectiveMatrixIsDoubtful) {
     EXPECT_TRUE(out_.empty());
 }
 
+TEST_F(MatrixFunctions, LogarithmsWhoseExponentialOverflowsAreNotAccepted) {
+    // Defective to working precision, so that the elements of the logarithm reach 1e10.
+    HostMatrix<double> gallery(5, 5,
+                               {-9,   11,     -21,  63,    -252, 70,     -69,   141,  -421,  1684, -575,  575,  -1149,
+                                3451, -13801, 3891, -3891, 7782, -23345, 93365, 1024, -1024, 2048, -6144, 24572});
+    EXPECT_EQ(MatrixLn_head(gallery.handle(), out_.handle(), &err_), 0);
+    EXPECT_NE(err_, 0);
+}
+
 TEST_F(MatrixFunctions, RootsSquareToTheMatrix) {
     HostMatrix<double> a(3, 3, {4, 1, 0, 1, 3, 1, 0.5, 1, 5});
     EXPECT_EQ(MatrixSqrtH(a.handle(), out_.handle()), 0);
