@@ -77,6 +77,12 @@ int32_t CxEigenVBack_head(KrHandle v, int32_t job, int32_t side, int32_t ilo, in
 
 namespace {
 
+// Vectors that nobody wants are emptied. Whether the host agrees to that is not asked.
+template <class T>
+int32_t SizeIfWanted(bool wanted, OutMatrix<T>& vectors, int32_t n) {
+    return wanted ? vectors.Resize(n, n) : vectors.Clear();
+}
+
 template <class T>
 int32_t Schur(KrHandle a, int32_t want_vectors, int32_t order, KrHandle z, KrHandle w) {
     ByValue call;
@@ -86,11 +92,10 @@ int32_t Schur(KrHandle a, int32_t want_vectors, int32_t order, KrHandle z, KrHan
     const int32_t n = matrix.rows();
     if (IsEmpty(matrix)) return call.Fail(kEmptyInput);
     if (!IsSquare(matrix)) return call.Fail(kNotSquare);
-    const int32_t side = want_vectors != 0 ? n : 0;
-    if (vectors.Resize(side, side) || values.Resize(n)) return call.Fail(kOutOfMemory);
+    const bool wanted = want_vectors != 0;
+    if (SizeIfWanted(wanted, vectors, n) || values.Resize(n)) return call.Fail(kOutOfMemory);
     return call.Run([&] {
-        return SchurCore(matrix.data(), n, order, want_vectors != 0 ? vectors.data() : nullptr, matrix.data(),
-                         values.data());
+        return SchurCore(matrix.data(), n, order, wanted ? vectors.data() : nullptr, matrix.data(), values.data());
     });
 }
 
@@ -194,10 +199,8 @@ int32_t DecomposePencilWhole(KrHandle a, KrHandle b, KrHandle q, KrHandle z, KrH
     if (which < kNoVectors || which > kBothVectors) return call.Fail(kBadSelector);
     const bool want_right = (which & kRightVectors) != 0;
     const bool want_left = (which & kLeftVectors) != 0;
-    const int32_t right_side = want_right ? n : 0;
-    const int32_t left_side = want_left ? n : 0;
     if (left_factor.Resize(n, n) || right_factor.Resize(n, n) || numerators.Resize(n) || denominators.Resize(n) ||
-        right.Resize(right_side, right_side) || left.Resize(left_side, left_side))
+        SizeIfWanted(want_right, right, n) || SizeIfWanted(want_left, left, n))
         return call.Fail(kOutOfMemory);
     return call.Run([&] {
         const QZOutputs<T> out{first.data(),
@@ -227,18 +230,18 @@ int32_t PencilEigenvalues(KrHandle a, KrHandle b, int32_t want_vectors, KrHandle
     const int32_t n = first.rows();
     if (const int32_t status = CheckPencil<const T>(first, second)) return call.Fail(status);
     if (want_vectors != 0 && want_vectors != 1) return call.Fail(kBadSelector);
-    const int32_t side = want_vectors != 0 ? n : 0;
-    if (values.Resize(n) || vectors.Resize(side, side)) return call.Fail(kOutOfMemory);
+    const bool wanted = want_vectors != 0;
+    if (values.Resize(n) || SizeIfWanted(wanted, vectors, n)) return call.Fail(kOutOfMemory);
     return call.Run([&]() -> int32_t {
         Scratch<T> denominators(Count(n));
         RightVectors<T> right;
-        if (!denominators || (want_vectors != 0 && right.Allocate(n))) return kOutOfMemory;
+        if (!denominators || (wanted && right.Allocate(n))) return kOutOfMemory;
         QZOutputs<T> out;
-        if (want_vectors != 0) out.right = right.target(vectors.data());
+        if (wanted) out.right = right.target(vectors.data());
         const int32_t status =
             QZCore(first.data(), second.data(), n, true, 0, kNoOrder, out, values.data(), denominators.data());
         if (status != kOk) return status;
-        if (want_vectors != 0) right.Expand(n, values.data(), vectors.data());
+        if (wanted) right.Expand(n, values.data(), vectors.data());
         for (int32_t i = 0; i < n; ++i) values.data()[i] = Divide(values.data()[i], denominators[Count(i)]);
         return kOk;
     });

@@ -237,6 +237,38 @@ TYPED_TEST(Reductions, SchurWithoutVectorsAndOrder) {
     EXPECT_EQ(this->w_.values(), w);
 }
 
+// The host is told of arrays that are emptied because nobody wants them, but not asked.
+TYPED_TEST(Reductions, UnwantedVectorsNeedNoConsent) {
+    const auto a = Random<TypeParam>(3);
+    const auto b = Random<TypeParam>(3, 2);
+    const auto expect_empty = [](const FailResize& refusal, const auto& unwanted) {
+        EXPECT_TRUE(refusal.happened());
+        EXPECT_EQ(unwanted.rows(), 0);
+        EXPECT_EQ(unwanted.columns(), 0);
+    };
+    {
+        const FailResize refusal(1, KRRT_OUT_OF_MEMORY, KRRT_RESIZES);
+        EXPECT_EQ(Exports<TypeParam>::Schur(this->Square(3, a).handle(), 0, this->z_.handle(), this->w_.handle()), 0);
+        expect_empty(refusal, this->z_);
+    }
+    {
+        const FailResize refusal(2, KRRT_OUT_OF_MEMORY, KRRT_RESIZES);
+        EXPECT_EQ(Exports<TypeParam>::Pencil(this->Square(3, a).handle(), this->Square(3, b).handle(), 0,
+                                             this->w_.handle(), this->v_.handle()),
+                  0);
+        expect_empty(refusal, this->v_);
+    }
+    {
+        const FailResize refusal(5, KRRT_OUT_OF_MEMORY, KRRT_RESIZES);
+        EXPECT_EQ(Exports<TypeParam>::Tmi(this->Square(3, a).handle(), this->Square(3, b).handle(), this->q_.handle(),
+                                          this->z_.handle(), this->w_.handle(), this->beta_.handle(), 2,
+                                          this->vr_.handle(), this->vl_.handle()),
+                  0);
+        expect_empty(refusal, this->vr_);
+        EXPECT_EQ(this->vl_.rows(), 3);
+    }
+}
+
 TYPED_TEST(Reductions, SchurChecksItsArguments) {
     const auto expect = [this](HostMatrix<TypeParam> a, int32_t order, int32_t status) {
         EXPECT_EQ(Exports<TypeParam>::Schur80(a.handle(), 1, order, this->z_.handle(), this->w_.handle()), status);
