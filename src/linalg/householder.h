@@ -18,10 +18,12 @@ struct Reflector {
     double h = 0.0;  // 0 where x was 0 and there is nothing to reflect
 };
 
-// a / |a|, and 1 for 0.
+// a / |a|, and 1 for 0. Its modulus is 1 even where that of a is subnormal and has few digits.
 inline Complex Phase(Complex a) {
-    const double modulus = Hypotenuse(a.re, a.im);
-    return modulus > 0.0 ? a / modulus : Complex{1.0, 0.0};
+    const double larger = std::fmax(std::fabs(a.re), std::fabs(a.im));
+    if (larger == 0.0) return {1.0, 0.0};
+    const Complex scaled = a / larger;
+    return scaled / Modulus(scaled);
 }
 
 // What a reflector's image contributes to a condensed form that has to be real. For a complex image that is its
@@ -52,7 +54,7 @@ Reflector<T> MakeReflector(T* x, std::ptrdiff_t count, std::ptrdiff_t stride) {
     double h;
     if constexpr (kIsComplex<T>) {
         const double modulus = Hypotenuse(first.re, first.im);
-        image = modulus > 0.0 ? first * (-root / modulus) : Complex{-root, 0.0};
+        image = Phase(first) * -root;
         h = -modulus * root - squares;
     } else {
         image = first < 0.0 ? root : -root;

@@ -206,6 +206,23 @@ TYPED_TEST(Svd, KeepsItsAccuracyAtOtherScales) {
     }
 }
 
+// The phase of a complex element is good even where its modulus has hardly a digit, or nearly nothing beside the
+// others.
+TYPED_TEST(Svd, ReflectsColumnsThatBeginWithAVanishingElement) {
+    using T = TypeParam;
+    for (const double tiny : {5e-324, 1.5e-323, 1e-310, 1e-300}) {
+        DenseMatrix<T> a = RandomMatrix<T>(4, 3, 11);
+        a(0, 0) = FromReal<T>(tiny);
+        if constexpr (kIsComplex<T>) a(0, 0).im = -2.0 * tiny;
+        this->ExpectDecomposition(a);
+        this->ExpectDecomposition(Adjoint(a));
+    }
+    std::vector<double> s(1);
+    const std::vector<T> column = {FromReal<T>(0.5), FromReal<T>(1.7e308)};
+    ASSERT_EQ(SvdValuesCore(column.data(), 2, 1, s.data()), kOk);
+    EXPECT_DOUBLE_EQ(s[0], 1.7e308);
+}
+
 TEST(SvdOfReals, GivesTheReflectorsSignsToSingleElements) {
     const auto single = [](double x) {
         DenseMatrix<double> a(1, 1);
