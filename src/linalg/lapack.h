@@ -114,17 +114,11 @@ void ztgevc_(const char& side, const char& howmny, const Int* select, const Int&
 void dgelsd_(const Int& m, const Int& n, const Int& nrhs, double* a, const Int& lda, double* b, const Int& ldb,
              double* s, const double& rcond, Int& rank, double* work, const Int& lwork, Int* iwork, Int& info);
 double dlapy2_(const double& x, const double& y);
-void dcopy_(const Int& n, const double* x, const Int& incx, double* y, const Int& incy);
-void zcopy_(const Int& n, const Complex* x, const Int& incx, Complex* y, const Int& incy);
 
 void cblas_dgemm(int order, int transa, int transb, Int m, Int n, Int k, double alpha, const double* a, Int lda,
                  const double* b, Int ldb, double beta, double* c, Int ldc);
 void cblas_zgemm(int order, int transa, int transb, Int m, Int n, Int k, const Complex* alpha, const Complex* a,
                  Int lda, const Complex* b, Int ldb, const Complex* beta, Complex* c, Int ldc);
-void cblas_dgemv(int order, int trans, Int m, Int n, double alpha, const double* a, Int lda, const double* x, Int incx,
-                 double beta, double* y, Int incy);
-void cblas_zgemv(int order, int trans, Int m, Int n, const Complex* alpha, const Complex* a, Int lda, const Complex* x,
-                 Int incx, const Complex* beta, Complex* y, Int incy);
 }
 
 template <class T, class Real, class Twin>
@@ -338,22 +332,6 @@ inline void Gemm(Order order, Transposition transa, Transposition transb, int32_
                  Complex alpha, const Complex* a, int32_t lda, const Complex* b, int32_t ldb, Complex beta, Complex* c,
                  int32_t ldc) {
     fortran::cblas_zgemm(order, transa, transb, m, n, k, &alpha, a, lda, b, ldb, &beta, c, ldc);
-}
-
-// y = alpha op(A) x + beta y with A of m rows and n columns.
-inline void Gemv(Order order, Transposition trans, int32_t m, int32_t n, double alpha, const double* a, int32_t lda,
-                 const double* x, int32_t incx, double beta, double* y, int32_t incy) {
-    fortran::cblas_dgemv(order, trans, m, n, alpha, a, lda, x, incx, beta, y, incy);
-}
-
-inline void Gemv(Order order, Transposition trans, int32_t m, int32_t n, Complex alpha, const Complex* a, int32_t lda,
-                 const Complex* x, int32_t incx, Complex beta, Complex* y, int32_t incy) {
-    fortran::cblas_zgemv(order, trans, m, n, &alpha, a, lda, x, incx, &beta, y, incy);
-}
-
-template <class T>
-void Copy(int32_t n, const T* x, int32_t incx, T* y, int32_t incy) {
-    fortran::Choose<T>(fortran::dcopy_, fortran::zcopy_)(n, x, incx, y, incy);
 }
 
 // Modulus without unnecessary overflow.

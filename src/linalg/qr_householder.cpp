@@ -21,8 +21,7 @@ int32_t QRHouseholder(const T* a, int32_t m, int32_t n, int32_t format, std::typ
     if (m < 1 || n < 1) return kEmptyInput;
     const int32_t reflectors = std::min(m, n), rows = QRRows(m, n, format);
     const int32_t stride = q != nullptr ? std::max(n, rows) : n;
-    constexpr std::size_t kOverread = 64;  // the complex gemv kernels of OpenBLAS load past the end of the matrix
-    Scratch<T> rows_of_a(Count(m) * Count(stride) + kOverread), tau(Count(reflectors)), space;
+    Scratch<T> rows_of_a(Count(m) * Count(stride)), tau(Count(reflectors)), space;
     if (!rows_of_a || !tau) return kOutOfMemory;
     const auto row = [&](int32_t i) { return rows_of_a.data() + Count(i) * Count(stride); };
     for (int32_t i = 0; i < m; ++i) std::copy_n(a + Count(i) * Count(n), n, row(i));

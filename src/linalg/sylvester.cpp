@@ -85,11 +85,11 @@ int32_t LeastSquares(Complex* matrix, int32_t order, double rcond, Complex* b) {
         return kOk;
     }
     const Complex one{1.0, 0.0};
-    lapack::Gemv(lapack::kRowMajor, lapack::kConjugateTranspose, order, rank, one, matrix, order, b, 1, {},
-                 projection.data(), 1);
+    lapack::Gemm(lapack::kRowMajor, lapack::kConjugateTranspose, lapack::kNoTranspose, rank, 1, order, one, matrix,
+                 order, b, 1, {}, projection.data(), 1);
     for (size_t i = 0; i < Count(rank); ++i) projection[i] = projection[i] / s[i];
-    lapack::Gemv(lapack::kRowMajor, lapack::kNoTranspose, order, rank, one, v.data(), order, projection.data(), 1, {},
-                 b, 1);
+    lapack::Gemm(lapack::kRowMajor, lapack::kNoTranspose, lapack::kNoTranspose, order, 1, rank, one, v.data(), order,
+                 projection.data(), 1, {}, b, 1);
     return kOk;
 }
 

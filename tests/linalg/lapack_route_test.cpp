@@ -1,16 +1,28 @@
 // LAPACK as it is linked in: the numbers come out right, bad arguments come back as info without a word and without
 // the end of the process, no thread is started, and several threads may call at once.
 #include <gtest/gtest.h>
-#include <sys/types.h>
+#include <sys/mman.h>
+#include <unistd.h>
 
 #include <cstdlib>
 #include <filesystem>
 #include <iterator>
+#include <new>
 #include <string>
 #include <thread>
 #include <vector>
 
 #include "linalg/lapack.h"
+
+extern "C" {
+void zgemv_(const char& trans, const int32_t& m, const int32_t& n, const krnumer::Complex& alpha,
+            const krnumer::Complex* a, const int32_t& lda, const krnumer::Complex* x, const int32_t& incx,
+            const krnumer::Complex& beta, krnumer::Complex* y, const int32_t& incy, std::size_t);
+krnumer::Complex zdotu_(const int32_t& n, const krnumer::Complex* x, const int32_t& incx, const krnumer::Complex* y,
+                        const int32_t& incy);
+krnumer::Complex zdotc_(const int32_t& n, const krnumer::Complex* x, const int32_t& incx, const krnumer::Complex* y,
+                        const int32_t& incy);
+}
 
 namespace krnumer {
 namespace {
@@ -86,16 +98,6 @@ TYPED_TEST(LapackRoute, MultipliesExactly) {
     EXPECT_EQ(Product(a, b, kSize), ProductByDefinition(a, b, kSize));
 }
 
-TYPED_TEST(LapackRoute, MultipliesByAVector) {
-    const auto a = IntegerMatrix<TypeParam>(3, 4);
-    const std::vector<TypeParam> x(3, Element<TypeParam>(1, 0));
-    std::vector<TypeParam> y(3), sums;
-    lapack::Gemv(lapack::kRowMajor, lapack::kNoTranspose, 3, 3, Element<TypeParam>(1, 0), a.data(), 3, x.data(), 1,
-                 Element<TypeParam>(0, 0), y.data(), 1);
-    for (std::size_t row = 0; row < 3; ++row) sums.push_back(a[3 * row] + a[3 * row + 1] + a[3 * row + 2]);
-    EXPECT_EQ(y, sums);
-}
-
 // The blocked reductions join option strings, which is all that is left of the Fortran run time: L Q gives A back.
 TYPED_TEST(LapackRoute, FactorsInBlocks) {
     const auto a = IntegerMatrix<TypeParam>(kSize, 3);
@@ -157,6 +159,69 @@ TYPED_TEST(LapackRoute, ServesSeveralThreadsAtOnce) {
         }
     }
     EXPECT_EQ(wrong, std::vector<int>(kThreads, 0));
+}
+
+// Elements whose last one is the last that may be read before unmapped memory.
+class AtTheEdge {
+  public:
+    explicit AtTheEdge(std::size_t count) : page_(static_cast<std::size_t>(sysconf(_SC_PAGESIZE))) {
+        const std::size_t bytes = count * sizeof(Complex);
+        mapped_ = (bytes + page_ - 1) / page_ * page_;
+        void* const memory = mmap(nullptr, mapped_ + page_, PROT_READ | PROT_WRITE, MAP_PRIVATE | MAP_ANONYMOUS, -1, 0);
+        if (memory == MAP_FAILED) throw std::bad_alloc();
+        memory_ = static_cast<char*>(memory);
+        mprotect(memory_ + mapped_, page_, PROT_NONE);
+        elements_ = reinterpret_cast<Complex*>(memory_ + mapped_ - bytes);
+        for (std::size_t i = 0; i < count; ++i) elements_[i] = {1.0 + static_cast<double>(i % 5), -1.0};
+    }
+    AtTheEdge(const AtTheEdge&) = delete;
+    AtTheEdge& operator=(const AtTheEdge&) = delete;
+    ~AtTheEdge() { munmap(memory_, mapped_ + page_); }
+
+    Complex* data() const { return elements_; }
+    Complex operator[](std::size_t i) const { return elements_[i]; }
+
+  private:
+    std::size_t page_;
+    std::size_t mapped_;
+    char* memory_;
+    Complex* elements_;
+};
+
+// The kernels of some processors load what lies behind the last column.
+TEST(LapackBounds, KeepAMatrixTimesAVectorInsideOfTheMatrix) {
+    for (int32_t m = 1; m <= 9; ++m) {
+        for (int32_t n = 1; n <= 9; ++n) {
+            for (const int32_t step : {1, 2, -1, -3}) {
+                const auto x_count = Count((n - 1) * std::abs(step) + 1);
+                const AtTheEdge a(Count(m * n)), x(x_count), y(Count(m));
+                const auto x_at = [&](int32_t j) { return x[Count(step > 0 ? j * step : (j + 1 - n) * step)]; };
+                std::vector<Complex> product(Count(m));
+                for (int32_t i = 0; i < m; ++i) {
+                    Complex sum{};
+                    for (int32_t j = 0; j < n; ++j) sum += a[Count(j * m + i)] * x_at(j);
+                    product[Count(i)] = Complex{2, 0} * sum + Complex{0, 3} * y[Count(i)];
+                }
+                zgemv_('N', m, n, Complex{2, 0}, a.data(), m, x.data(), step, Complex{0, 3}, y.data(), 1, 1);
+                EXPECT_EQ(std::vector<Complex>(y.data(), y.data() + m), product) << m << " " << n << " " << step;
+            }
+        }
+    }
+}
+
+TEST(LapackBounds, KeepADotProductInsideOfTheVectors) {
+    for (int32_t n = 1; n <= 9; ++n) {
+        for (const int32_t step : {1, 2, 5}) {
+            const AtTheEdge x(Count((n - 1) * step + 1)), y(Count(n));
+            Complex plain{}, conjugated{};
+            for (int32_t i = 0; i < n; ++i) {
+                plain += x[Count(i * step)] * y[Count(i)];
+                conjugated += Conjugate(x[Count(i * step)]) * y[Count(i)];
+            }
+            EXPECT_EQ(zdotu_(n, x.data(), step, y.data(), 1), plain) << n << " " << step;
+            EXPECT_EQ(zdotc_(n, x.data(), step, y.data(), 1), conjugated) << n << " " << step;
+        }
+    }
 }
 
 // A known spectrum through the Schur form, in both its signatures.
