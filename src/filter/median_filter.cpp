@@ -63,6 +63,11 @@ int32_t MedianFilter(double* x, int32_t n, int32_t left, int32_t right) {
 
     const int64_t width = int64_t{left} + right + 1;
     if (width > INT32_MAX) return kOutOfMemory;
+    // Where no window holds more samples than zeros, none needs to be made: a wide one may be beyond all memory.
+    if (width > 2 * int64_t{n}) {
+        std::fill_n(x, n, 0.0);
+        return kOk;
+    }
     Scratch<double> samples(static_cast<size_t>(width));
     // What the output has overwritten: the sample at i stands at i modulo `left`.
     Scratch<double> history(Count(left), Scratch<double>::kZeroed);

@@ -92,6 +92,20 @@ TEST(MedianFilter, SeesZerosOutside) {
     EXPECT_THAT(x.values(), ElementsAre(0.0, 0.0, 0.0));
 }
 
+TEST(MedianFilter, NeedsNoMemoryForZerosThatAreTheMajority) {
+    HostArray<double> x{3.0, -1.0, kInfinity};
+    EXPECT_EQ(MedianFilter81_H(x.handle(), kMost - 1, 0), kOk);
+    EXPECT_THAT(x.values(), ElementsAre(0.0, 0.0, 0.0));
+    for (int32_t left = 0; left < 12; ++left) {
+        for (int32_t right = 0; right < 4; ++right) {
+            std::vector<double> samples{3.0, 1.0, 2.0, 5.0};
+            const auto expected = MediansOneByOne(samples, left, right);
+            ASSERT_EQ(MedianFilter(samples.data(), 4, left, right), kOk);
+            EXPECT_EQ(samples, expected) << left << " " << right;
+        }
+    }
+}
+
 TEST(MedianFilter, TakesTheMeanInAnEvenWindow) {
     HostArray<double> x{1.0, 5.0, 3.0};
     EXPECT_EQ(MedianFilter81_H(x.handle(), 1, 0), kOk);
