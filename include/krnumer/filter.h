@@ -130,7 +130,7 @@ KRNUMER_API int32_t EllipticCoefs(const double* fs, const double* fl, const doub
  *                              is empty
  * @param[in]     init          1: go on from the states; any other value: clear them first
  * @param[out]    err           status: 0; -20003 when `x` is empty (nothing is touched); -20008 when there is `a` and
- * no `b`; -20001 out of memory. The last two leave `x` and both states empty.
+ *                              no `b`; -20001 out of memory. The last two leave `x` and both states empty.
  * @return                      0, or the status of the host when it refused a resize
  */
 KRNUMER_API int32_t IIR_Filter(KrHandle x, KrHandle a, KrHandle b, KrHandle forwardState, KrHandle reverseState,
@@ -152,7 +152,7 @@ KRNUMER_API int32_t CxIIR_Filter_H(KrHandle x, KrHandle a, KrHandle b, KrHandle 
  *
  * @param[in]     x             1-D double: the signal
  * @param[out]    y             1-D complex, as long as `x`: the filtered signal; as it came when both coefficient
- * arrays are empty
+ *                              arrays are empty
  * @param[in]     a             1-D complex: feedback coefficients, or empty
  * @param[in]     b             1-D complex: feedforward coefficients
  * @param[in,out] forwardState  1-D double, nb - 1 elements: the last inputs, the oldest first
@@ -238,11 +238,13 @@ KRNUMER_API int32_t FIRCoefs(const double* fs, const double* fl, const double* f
  * @param[out] ripple         the largest error where the weight is 1; NaN on failure
  * @param[in]  maxIterations  rounds of the exchange, one less than this at the most; 100 when below 1
  * @param[out] err            status, by the first that applies: 0; -20021 `taps` below 1; -20023 another type; -20031
- * no bands; -20001 out of memory; -20031 `taps` below 3; -20023 `fs` not positive, an edge or `desired` negative, or
- * `weight` not positive; -20020 the last edge above fs/2; -20023 edges not ascending; -20031 bands that the type cannot
- * serve; -20033 even `taps` where a multiband filter shall let pass fs/2; -20001 too many taps; -20031 the exchange
- * failed or needs more rounds
- * @return                    0, or 2 when memory ran out in the design or there are too many taps
+ *                            no bands; -20001 out of memory; -20031 `taps` below 3; -20023 `fs` not positive, an edge
+ *                            or `desired` negative, or `weight` not positive; -20020 the last edge above fs/2; -20023
+ *                            edges not ascending; -20031 bands that the type cannot serve; -20033 even `taps` where a
+ *                            multiband filter shall let pass fs/2; -20001 too many taps; -20031 the exchange failed or
+ *                            needs more rounds
+ * @return                    0; the status of the host when it refused the resize; 2 when memory ran out in the design
+ *                            or there are too many taps
  */
 KRNUMER_API int32_t Parks(const int32_t* taps, const double* fs, KrHandle bands, const int32_t* type, KrHandle h,
                           double* ripple, const int32_t* maxIterations, int32_t* err);
@@ -299,7 +301,7 @@ KRNUMER_API int32_t CxSigFIRnarrowFilter_head(KrHandle x, const KrNarrowbandFilt
  * @param[in,out] x     1-D double, n samples; empty on failure
  * @param[in]     rank  samples on each side; 0 leaves the signal as it is
  * @param[out]    err   status, by the first that applies: 0; -20032 `rank` negative; -20008 n not above `rank` (an
- * empty signal passes); -20001 out of memory
+ *                      empty signal passes); -20001 out of memory
  * @return              0
  */
 KRNUMER_API int32_t MedianFilterCIN(KrHandle x, const int32_t* rank, int32_t* err);
@@ -312,7 +314,7 @@ KRNUMER_API int32_t MedianFilterCIN(KrHandle x, const int32_t* rank, int32_t* er
  * @param[in]     left   samples before the middle; may exceed n
  * @param[in]     right  samples behind the middle; negative: as many as before it
  * @return               0, or the first that applies: -20032 `left` negative; -20008 n not above `right` (an empty
- * signal passes); -20001 out of memory
+ *                       signal passes); -20001 out of memory
  */
 KRNUMER_API int32_t MedianFilter81_H(KrHandle x, int32_t left, int32_t right);
 
@@ -332,8 +334,9 @@ KRNUMER_API int32_t MedianFilter81_H(KrHandle x, int32_t left, int32_t right);
  * @param[out] smoothing            2-D double, `frame` by `frame`
  * @param[out] differentiators      2-D double, order + 1 rows of `frame` columns
  * @return                          0, or the first that applies: -20063 `order` below 1; -20037 `frame` not above
- * `order`; -20002 another number of weights; -20001 out of memory; -20033 `frame` even; -20068 a weight that is not
- * finite; -20071 weights that leave the polynomial undetermined. Both matrices are empty on failure.
+ *                                  `order`; -20002 another number of weights; -20001 out of memory; -20033 `frame`
+ *                                  even; -20068 a weight that is not finite; -20071 weights that leave the polynomial
+ *                                  undetermined. Both matrices are empty on failure.
  */
 KRNUMER_API int32_t SavitzkyGolayCoefH(int32_t order, int32_t frame, KrHandle weights, int32_t wantDifferentiators,
                                        KrHandle smoothing, KrHandle differentiators);
@@ -367,7 +370,7 @@ KRNUMER_API int32_t SavitzkyGolayFiltH(KrHandle x, int32_t order, int32_t frame,
  * @param[in,out] reverseState1  1-D double, na - 1 elements: state of the forward pass
  * @param[in,out] reverseState2  1-D double, na - 1 elements: state of the backward pass
  * @param[in]     keepState      0 clears the states first. A state of another length is resized and cleared in any
- * case. Reverse states are not looked at when `a` is empty.
+ *                               case. Reverse states are not looked at when `a` is empty.
  * @return                       0; -20003 `x` empty (nothing is touched); -20008 `a` without `b`, -20001 out of memory
  *                               (both leave the four states empty)
  */

@@ -22,7 +22,7 @@ class Edge {
         angle_ += w_;
         return value;
     }
-    double InTheMiddle() const { return sign_ * w_ * kPerPi; }
+    double MiddleTimesPi() const { return sign_ * w_; }
 
   private:
     double sign_;
@@ -52,7 +52,8 @@ int32_t TruncatedIdealDesign(double fs, double fl, double fh, int32_t type, doub
         h[i] = h[taps - 1 - i] = (upper.Next() + lower.Next()) / divisor;
         divisor += kPi;
     }
-    if (taps % 2 != 0) h[taps / 2] = (passes_nyquist ? 1.0 : 0.0) + (upper.InTheMiddle() + lower.InTheMiddle());
+    if (taps % 2 != 0)
+        h[taps / 2] = (passes_nyquist ? 1.0 : 0.0) + (upper.MiddleTimesPi() + lower.MiddleTimesPi()) * kPerPi;
     return kOk;
 }
 

@@ -64,7 +64,7 @@ int32_t Parks(const int32_t* taps, const double* fs, KrHandle bands, const int32
     if (*taps < 1) return call.Fail(kBadOrder);
     if (!IsFirClass(fir_class)) return call.Fail(kBadFrequency);
     if (wanted.size() < 1) return call.Fail(kBadBands);
-    if (response.Resize(*taps)) return call.Fail(kOutOfMemory);
+    if (auto host = response.Resize(*taps)) return call.HostFailure(host);
     int32_t status = call.Map();
     if (status == kOk)
         status = EquirippleDesign(*taps, *fs, wanted.data(), wanted.size(), static_cast<FirClass>(fir_class),

@@ -9,8 +9,7 @@ using namespace krnumer;
 namespace {
 
 template <class Core>
-int32_t Design(const FilterBand& band, KrHandle a, KrHandle b, int32_t* err, Core core) {
-    ByReference call(err);
+int32_t Design(Call& call, const FilterBand& band, KrHandle a, KrHandle b, Core core) {
     Out<double> feedback(call, a), feedforward(call, b);
     const CascadeLengths lengths = LengthsOf(band.order, band.type);
     if (lengths.a < 1 || lengths.b < 1) return call.Fail(kBadOrder);
@@ -26,33 +25,39 @@ int32_t Design(const FilterBand& band, KrHandle a, KrHandle b, int32_t* err, Cor
 
 int32_t BWCoefs(const double* fs, const double* fl, const double* fh, const int32_t* order, const int32_t* type,
                 KrHandle a, KrHandle b, int32_t* err) {
+    ByReference call(err);
     const FilterBand band{*fs, *fl, *fh, *order, *type};
-    return Design(band, a, b, err, [&](const CascadeOutput& output) { return ButterworthDesign(band, output); });
+    return Design(call, band, a, b, [&](const CascadeOutput& output) { return ButterworthDesign(band, output); });
 }
 
 int32_t BesselCoefs(const double* fs, const double* fl, const double* fh, const int32_t* order, const int32_t* type,
                     KrHandle a, KrHandle b, int32_t* err) {
+    ByReference call(err);
     const FilterBand band{*fs, *fl, *fh, *order, *type};
-    return Design(band, a, b, err, [&](const CascadeOutput& output) { return BesselDesign(band, output); });
+    return Design(call, band, a, b, [&](const CascadeOutput& output) { return BesselDesign(band, output); });
 }
 
 int32_t ChebyshevCoefs(const double* fs, const double* fl, const double* fh, const double* ripple, const int32_t* order,
                        const int32_t* type, KrHandle a, KrHandle b, int32_t* err) {
+    ByReference call(err);
     const FilterBand band{*fs, *fl, *fh, *order, *type};
-    return Design(band, a, b, err, [&](const CascadeOutput& output) { return ChebyshevDesign(band, *ripple, output); });
+    return Design(call, band, a, b,
+                  [&](const CascadeOutput& output) { return ChebyshevDesign(band, *ripple, output); });
 }
 
 int32_t InvChebyshevCoefs(const double* fs, const double* fl, const double* fh, const double* attenuation,
                           const int32_t* order, const int32_t* type, KrHandle a, KrHandle b, int32_t* err) {
+    ByReference call(err);
     const FilterBand band{*fs, *fl, *fh, *order, *type};
-    return Design(band, a, b, err,
+    return Design(call, band, a, b,
                   [&](const CascadeOutput& output) { return InverseChebyshevDesign(band, *attenuation, output); });
 }
 
 int32_t EllipticCoefs(const double* fs, const double* fl, const double* fh, const double* ripple,
                       const double* attenuation, const int32_t* order, const int32_t* type, KrHandle a, KrHandle b,
                       int32_t* err) {
+    ByReference call(err);
     const FilterBand band{*fs, *fl, *fh, *order, *type};
-    return Design(band, a, b, err,
+    return Design(call, band, a, b,
                   [&](const CascadeOutput& output) { return EllipticDesign(band, *ripple, *attenuation, output); });
 }

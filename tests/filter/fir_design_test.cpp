@@ -71,6 +71,22 @@ TEST(FirCoefs, OfOneTapIsTheWidthOfTheBand) {
     }
 }
 
+// The width of the band times 1 / pi, formed as that: the middle tap has no other rounding.
+TEST(FirCoefs, HasTheWidthOfTheBandInTheMiddle) {
+    Truncated design;
+    for (int32_t fl = 1; fl < 250; ++fl) {
+        design.fl = fl;
+        design.fh = 2.0 * fl - 0.5;
+        const double width = 2.0 * kPi * design.fh / 1000.0 - 2.0 * kPi * design.fl / 1000.0;
+        design.type = 2;
+        design.Make();
+        EXPECT_EQ(design.h[3], width * 0.3183098861837907);
+        design.type = 3;
+        design.Make();
+        EXPECT_EQ(design.h[3], 1.0 - width * 0.3183098861837907);
+    }
+}
+
 TEST(FirCoefs, DoesNotLookAtTheUpperEdgeOfOneCutoff) {
     Truncated design;
     design.fh = -kInfinity;
@@ -366,10 +382,10 @@ TEST(Parks, ReportsTooManyTapsAsTheHostReportsMemory) {
     }
 }
 
-TEST(Parks, ReportsTheHostsRefusal) {
+TEST(Parks, HandsOnTheHostsRefusal) {
     Equiripple design;
     const FailResize failure(1, 4711);
-    EXPECT_EQ(design.Refusal(), kOutOfMemory);
+    EXPECT_EQ(design.Refusal(4711), kOutOfMemory);
 }
 
 TEST(Parks, DesignsLongFilters) {
