@@ -17,6 +17,8 @@
  *   that is no crossing. Rising and falling crossings alternate.
  * - Edges between the low and the high level: from the last crossing of the one to the first crossing of the other.
  *   Rising and falling edges alternate.
+ * - An edge's stretch, over which its overshoot and undershoot are looked for, reaches from the middle between it and
+ *   the edge before to the middle between it and the edge behind, or to the last sample.
  * - Cycle k lies between crossings 2k - 1 and 2k + 1, counted from 1. Pulse k of a polarity is the k-th complete one;
  *   one more crossing has to follow it in the samples. Edges belong together two by two.
  *
@@ -92,17 +94,16 @@ typedef struct KrStateMethod {
 /**
  * Where a measurement lies in the signal, for drawing. What is not named is 0.
  *
- * | Measurement            | left                                         | right             | values              |
- * |------------------------|----------------------------------------------|-------------------|---------------------|
- * | 0, 1, 9 to 14          | t0                                           | t0                | t0 + count dt, value |
- * | 2, 5, 8                | t0                                           | t0                | t0 + count dt, lower,
- * upper level | | 3, 4                   | t0                                           | t0                | t0 +
- * count dt; bottom, centre and top of the bin | | 6, 7                   | as the state or the extreme that they are |
- * |                     | | 15 to 18, 24, 25       | begin of the cycle                           | its end           |
- * mid level, twice    | | 22, 23, 30, 31         | begin of the pulse                           | its end           |
- * mid level, twice    | | 19, 20, 32, 33         | begin of the edge                            | its end           |
- * levels there        | | 26 to 29               | begin of the stretch about the edge          | its end           |
- * time and height of the extreme sample, state level |
+ * | Measurement      | left                          | right   | values                                             |
+ * |------------------|-------------------------------|---------|----------------------------------------------------|
+ * | 0, 1, 9 to 14    | t0                            | t0      | t0 + count dt, value                               |
+ * | 2, 5, 8          | t0                            | t0      | t0 + count dt, lower and upper level               |
+ * | 3, 4             | t0                            | t0      | t0 + count dt, bottom, centre and top of the bin   |
+ * | 6, 7             |                               |         | as the state or the extreme that they are          |
+ * | 15 to 18, 24, 25 | begin of the cycle            | its end | mid level, twice                                   |
+ * | 22, 23, 30, 31   | begin of the pulse            | its end | mid level, twice                                   |
+ * | 19, 20, 32, 33   | begin of the edge             | its end | levels at begin and end                            |
+ * | 26 to 29         | begin of the edge's stretch   | its end | time and height of the extreme sample, state level |
  */
 typedef struct KrMarkers {
     double left;

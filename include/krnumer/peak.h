@@ -79,7 +79,7 @@ KRNUMER_API int32_t PeakD(KrPeakRecord* record, KrPeakState* state, KrHandle* wo
  *                        failure
  * @param[out] count      number of runs; 0 on failure
  * @param[out] err        status: 0; -20003 when `x` is empty; -20013 when `width` is out of range; -20001 when
- * `indices` cannot be sized
+ *                        `indices` cannot be sized
  * @return                0, or the host's status when `indices` cannot be sized
  */
 KRNUMER_API int32_t PeakDetector(KrHandle x, const double* threshold, const int32_t* width, KrHandle indices,
