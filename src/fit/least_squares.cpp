@@ -4,6 +4,7 @@
 #include <cmath>
 
 #include "fit/residual.h"
+#include "fit/scaled_system.h"
 #include "frame/numeric.h"
 #include "frame/scratch.h"
 #include "frame/status.h"
@@ -71,23 +72,6 @@ int32_t SolveNormalEquations(const double* h, int32_t m, int32_t k, const double
     return CholeskySolveFull(normal.matrix.data(), k, 0, normal.right.data(), 1, coef);
 }
 
-// The system with every row multiplied by the root of its weight. `h` is destroyed by the solvers below.
-struct ScaledSystem {
-    int32_t Copy(const double* h_in, int32_t m, int32_t k, const double* y_in, const double* w) {
-        const std::size_t columns = Count(k);
-        if (!h.Allocate(Count(m) * columns) || !y.Allocate(Count(m))) return kOutOfMemory;
-        for (std::size_t i = 0; i < Count(m); ++i) {
-            const double scale = w != nullptr ? std::sqrt(std::fabs(w[i])) : 1.0;
-            for (std::size_t j = 0; j < columns; ++j) h[i * columns + j] = scale * h_in[i * columns + j];
-            y[i] = scale * y_in[i];
-        }
-        return kOk;
-    }
-
-    Scratch<double> h;
-    Scratch<double> y;
-};
-
 int32_t SolveBySvd(ScaledSystem& system, int32_t m, int32_t k, double* coef, double* covariance, int32_t method) {
     const std::size_t columns = Count(k);
     Scratch<double> work(2 * columns + columns * columns);
@@ -96,11 +80,11 @@ int32_t SolveBySvd(ScaledSystem& system, int32_t m, int32_t k, double* coef, dou
     double* const projection = s + columns;
     double* const v = projection + columns;
     double* const u = system.h.data();
-    if (const int32_t status = SvdCore(u, m, k, u, s, v, false)) return status;
+    if (const int32_t status = SvdCore(u, system.rows, k, u, s, v, false)) return status;
     const double threshold = method == kTruncatedSvdMethod ? m * s[0] * kEpsilon : 0.0;
 
     std::fill_n(projection, columns, 0.0);
-    for (std::size_t i = 0; i < Count(m); ++i)
+    for (std::size_t i = 0; i < Count(system.rows); ++i)
         for (std::size_t j = 0; j < columns; ++j) projection[j] += u[i * columns + j] * system.y[i];
     std::fill_n(coef, columns, 0.0);
     for (std::size_t j = 0; j < columns; ++j) {
@@ -116,7 +100,8 @@ int32_t SolveBySvd(ScaledSystem& system, int32_t m, int32_t k, double* coef, dou
     return kOk;
 }
 
-int32_t SolveByQR(ScaledSystem& system, int32_t m, int32_t k, double* coef, double* covariance) {
+int32_t SolveByQR(ScaledSystem& system, int32_t k, double* coef, double* covariance) {
+    const int32_t m = system.rows;
     const std::size_t columns = Count(k);
     Scratch<double> q(Count(m) * columns);
     Scratch<double> r(2 * columns * columns);
@@ -153,10 +138,10 @@ int32_t GenLSFitCore(const double* h, int32_t m, int32_t k, const double* y, con
         status = SolveNormalEquations(h, m, k, y, w, coef, covariance, method);
     } else {
         ScaledSystem system;
-        if (system.Copy(h, m, k, y, w)) return kOutOfMemory;
+        if (system.Load(h, m, k, y, w)) return kOutOfMemory;
         status = method == kSvdMethod || method == kTruncatedSvdMethod
                      ? SolveBySvd(system, m, k, coef, covariance, method)
-                     : SolveByQR(system, m, k, coef, covariance);
+                     : SolveByQR(system, k, coef, covariance);
     }
     if (status != kOk || best_fit == nullptr || mse == nullptr) return status;
     if (const int32_t failure = MatVecCore(h, m, k, coef, best_fit)) return failure;

@@ -6,6 +6,7 @@
 #include <gtest/gtest.h>
 
 #include <cmath>
+#include <limits>
 
 #include "fit/nist.h"
 #include "frame/numeric.h"
@@ -351,6 +352,81 @@ TEST_F(LinearFits, TreatNaNAsTheirMethodDoes) {
         EXPECT_TRUE(std::isnan(coef_[0]));
     }
     EXPECT_EQ(General(good, {1, kQuietNaN, 2}, {}, 5, 0), kNotFinite);
+}
+
+// Enough rows that the solvers see the triangle of the system instead of it.
+class LongSystems : public LinearFits {
+  protected:
+    static constexpr int32_t kRows = 10007;  // the last block is not full
+    static constexpr double kTruth[] = {3.0, -2.0, 0.5};
+
+    static double Basis(int32_t i, int32_t j) { return std::cos(0.001 * i * j); }
+
+    LongSystems() : h_(kRows, 3), y_(kRows), w_(kRows) {
+        for (int32_t i = 0; i < kRows; ++i) {
+            double sum = 0.0;
+            for (int32_t j = 0; j < 3; ++j) {
+                h_.Set(i, j, Basis(i, j));
+                sum += kTruth[j] * Basis(i, j);
+            }
+            // Blunders have no weight: with the weights the coefficients are exact.
+            w_[Count(i)] = i % 3 == 0 ? 0.0 : i % 2 == 0 ? 2.0 : -0.25;
+            y_[Count(i)] = i % 3 == 0 ? 1e3 * std::sin(i) : sum;
+        }
+    }
+
+    HostMatrix<double> h_;
+    Values y_, w_;
+};
+
+TEST_F(LongSystems, HaveTheCoefficientsAndTheCovarianceOfTheirRows) {
+    double information[3][3] = {};
+    for (int32_t i = 0; i < kRows; ++i)
+        for (int32_t j = 0; j < 3; ++j)
+            for (int32_t l = 0; l < 3; ++l) information[j][l] += std::fabs(w_[Count(i)]) * Basis(i, j) * Basis(i, l);
+    for (int32_t method = 0; method <= 6; ++method) {
+        ASSERT_EQ(General(h_, y_, w_, method, 1), 0);
+        ASSERT_EQ(coef_.size(), 3);
+        for (int32_t j = 0; j < 3; ++j) EXPECT_NEAR(coef_[j], kTruth[j], 2e-13) << method;
+        for (int32_t j = 0; j < 3; ++j) {
+            for (int32_t l = 0; l < 3; ++l) {
+                double product = 0.0;
+                for (int32_t k = 0; k < 3; ++k) product += information[j][k] * covariance_(k, l);
+                EXPECT_NEAR(product, j == l, 1e-11) << method;
+            }
+        }
+        EXPECT_EQ(fit_.size(), kRows);
+        EXPECT_NEAR(fit_[1], kTruth[0] + kTruth[1] * Basis(1, 1) + kTruth[2] * Basis(1, 2), 1e-12);
+        EXPECT_NEAR(mse_, 0.0, 1e-12);
+    }
+}
+
+TEST_F(LongSystems, WithoutWeightsAgreeWithTheNormalEquations) {
+    ASSERT_EQ(General(h_, y_, {}, 4, 0), 0);
+    const Values normal = coef_.values();
+    for (const int32_t method : {0, 1, 6}) {
+        ASSERT_EQ(General(h_, y_, {}, method, 0), 0);
+        for (size_t j = 0; j < 3; ++j) EXPECT_NEAR(coef_.values()[j], normal[j], 1e-10) << method;
+    }
+}
+
+TEST_F(LongSystems, ShowWhatCannotBeUsed) {
+    const double largest = std::numeric_limits<double>::max();
+    for (const double value : {kQuietNaN, kInfinity, largest, -largest}) {
+        for (const int32_t column : {0, 2}) {
+            h_.Set(kRows - 1, column, value);
+            for (const int32_t method : {0, 6}) EXPECT_EQ(General(h_, y_, {}, method, 0), kNotFinite);
+            EXPECT_EQ(General(h_, y_, {}, 3, 0), 0) << "not looked at";
+            h_.Set(kRows - 1, column, 1.0);
+        }
+    }
+    for (int32_t i = 0; i < kRows; ++i) h_.Set(i, 1, 0.0);
+    EXPECT_EQ(General(h_, y_, {}, 3, 0), kSingular);
+    for (const int32_t method : {0, 6}) EXPECT_EQ(General(h_, y_, {}, method, 0), 0);
+    EXPECT_EQ(coef_[1], 0.0);
+    y_[5] = kQuietNaN;
+    EXPECT_EQ(General(h_, y_, {}, 0, 0), 0);
+    EXPECT_TRUE(std::isnan(coef_[0]));
 }
 
 TEST_F(LinearFits, StepsOfANonlinearFit) {
