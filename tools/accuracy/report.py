@@ -20,10 +20,7 @@ matplotlib.use("Agg")
 import matplotlib.pyplot as plt  # noqa: E402
 
 import measure  # noqa: E402
-
-PAGE = measure.ROOT / "docs" / "accuracy.md"
-PICTURES = measure.ROOT / "docs" / "accuracy"
-BEGIN, END = "<!-- special functions: written by tools/accuracy/report.py -->", "<!-- end of special functions -->"
+import page  # noqa: E402
 
 INTRODUCTION = """\
 ## Special functions
@@ -79,7 +76,7 @@ def picture(function, measured):
     axes.set_xlabel("error in ulp")
     axes.set_title(function.title)
     axes.grid(axis="x", alpha=0.3)
-    fig.savefig(PICTURES / f"{function.name}.png", bbox_inches="tight", metadata={"Software": None},
+    fig.savefig(page.PICTURES / f"{function.name}.png", bbox_inches="tight", metadata={"Software": None},
                 pil_kwargs={"optimize": True})
     plt.close(fig)
 
@@ -92,16 +89,6 @@ def section(function, rows):
     return "\n".join(lines + ["", f"![{function.title}](accuracy/{function.name}.png)", ""])
 
 
-def write_page(text):
-    page = PAGE.read_text() if PAGE.exists() else "# Accuracy\n\n"
-    block = f"{BEGIN}\n\n{text}\n{END}\n"
-    if BEGIN in page:
-        page = page[: page.index(BEGIN)] + block + page[page.index(END) + len(END) :].lstrip("\n")
-    else:
-        page += block
-    PAGE.write_text(page)
-
-
 def main():
     parser = argparse.ArgumentParser(description=textwrap.dedent(__doc__),
                                      formatter_class=argparse.RawDescriptionHelpFormatter)
@@ -110,7 +97,7 @@ def main():
     parser.add_argument("names", nargs="*", metavar="NAME")
     options = parser.parse_args()
 
-    PICTURES.mkdir(parents=True, exist_ok=True)
+    page.PICTURES.mkdir(parents=True, exist_ok=True)
     cache = measure.ROOT / "build" / "accuracy.json"  # rows of earlier runs, for those with names
     rows = json.loads(cache.read_text()) if cache.exists() else {}
     library = measure.Library(options.library)
@@ -124,7 +111,7 @@ def main():
         cache.write_text(json.dumps(rows))
         print(function.name, flush=True)
     sections = [section(function, rows[function.name]) for function in functions if function.name in rows]
-    write_page("\n".join([INTRODUCTION.format(points=options.points), *sections]))
+    page.write("special functions", "report.py", "\n".join([INTRODUCTION.format(points=options.points), *sections]))
 
 
 if __name__ == "__main__":
