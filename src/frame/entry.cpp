@@ -3,6 +3,7 @@
 #include <cstdlib>
 
 #include "frame/host.h"
+#include "frame/memory.h"
 
 namespace krnumer {
 
@@ -88,7 +89,7 @@ int32_t ArrayView::Map() {
 
 int32_t ArrayView::TakeCopy() {
     const size_t bytes = count() * kind_.bytes;
-    copy_ = std::malloc(bytes > 0 ? bytes : 1);
+    copy_ = AllocateMemory(bytes);
     if (copy_ == nullptr) return kOutOfMemory;
     std::memcpy(copy_, area(), bytes);
     data_ = copy_;

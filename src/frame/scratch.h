@@ -7,9 +7,11 @@
 #include <type_traits>
 #include <utility>
 
+#include "frame/memory.h"
+
 namespace krnumer {
 
-// An array from malloc that goes back on every path. A failed allocation is tested at once and becomes -20001:
+// An array from AllocateMemory that goes back on every path. A failed allocation is tested at once and becomes -20001:
 //
 //     Scratch<double> sorted(Count(n));
 //     if (!sorted) return kOutOfMemory;
@@ -20,7 +22,9 @@ class Scratch {
     static_assert(std::is_trivially_copyable_v<T> && std::is_trivially_destructible_v<T>);
 
   public:
-    enum Fill { kUninitialised, kZeroed };
+    using Fill = MemoryFill;
+    static constexpr Fill kUninitialised = Fill::kUninitialised;
+    static constexpr Fill kZeroed = Fill::kZeroed;
 
     Scratch() = default;
     explicit Scratch(std::size_t count, Fill fill = kUninitialised) { static_cast<void>(Allocate(count, fill)); }
@@ -38,8 +42,7 @@ class Scratch {
         std::free(data_);
         data_ = nullptr;
         if (count > kMost) return false;
-        const std::size_t bytes = count > 0 ? count * sizeof(T) : 1;
-        data_ = static_cast<T*>(fill == kZeroed ? std::calloc(bytes, 1) : std::malloc(bytes));
+        data_ = static_cast<T*>(AllocateMemory(count * sizeof(T), fill));
         return data_ != nullptr;
     }
 

@@ -2,6 +2,8 @@
 
 #include <gtest/gtest.h>
 
+#include <algorithm>
+
 namespace krnumer {
 namespace {
 
@@ -12,6 +14,19 @@ TEST(Scratch, HoldsWhatWasAskedFor) {
     numbers[1] = 5.0;
     ASSERT_TRUE(numbers.Grow(1000));
     EXPECT_EQ(numbers[1], 5.0);
+}
+
+TEST(Scratch, HoldsMoreThanAHugePage) {
+    constexpr std::size_t kCount = (std::size_t{5} << 20) / sizeof(double) + 1;
+    for (int round = 0; round < 3; ++round) {  // the later ones in memory that was written to
+        Scratch<double> numbers(kCount, Scratch<double>::kZeroed);
+        ASSERT_TRUE(numbers);
+        EXPECT_EQ(std::count(numbers.data(), numbers.data() + kCount, 0.0), kCount);
+        std::fill_n(numbers.data(), kCount, 7.0);
+        ASSERT_TRUE(numbers.Grow(2 * kCount));
+        EXPECT_EQ(std::count(numbers.data(), numbers.data() + kCount, 7.0), kCount);
+        numbers[2 * kCount - 1] = 1.0;
+    }
 }
 
 TEST(Scratch, IsNoFailureWithoutElements) {
