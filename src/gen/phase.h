@@ -16,13 +16,14 @@ class Period {
     explicit constexpr Period(double length) : length_(length), inverse_(1.0 / length) {}
 
     double Remainder(double value) const {
-        return IsNear(value) ? NearRemainder(value) : Lift(std::fmod(value, length_));
+        const double lifted = IsNear(value) ? NearRemainder(value) : Lift(std::fmod(value, length_));
+        return lifted >= length_ ? 0.0 : lifted;
     }
 
-    // The same number without a call of fmod, so that loops over it become vector code. Multiples of the period are
-    // whole numbers below 2^41 here, and what stays after the subtraction needs no bit that `value` has not got, so all
-    // is exact but the lift, which fmod needs as well; whether the nearest multiple or the one beside it is taken off
-    // does not matter.
+    // The same number without a call of fmod, so that loops over it become vector code; only that a lift which rounds
+    // up gives `length` itself. Multiples of the period are whole numbers below 2^41 here, and what stays after the
+    // subtraction needs no bit that `value` has not got, so all is exact but the lift, which fmod needs as well;
+    // whether the nearest multiple or the one beside it is taken off does not matter.
     double NearRemainder(double value) const {
         constexpr double kWholeNumbers = 0x1.8p52;  // leaves no room for a fraction behind what is added to it
         const double periods = (value * inverse_ + kWholeNumbers) - kWholeNumbers;
@@ -32,10 +33,7 @@ class Period {
     static bool IsNear(double value) { return std::fabs(value) < 0x1p40; }
 
   private:
-    double Lift(double remainder) const {
-        const double lifted = remainder < 0.0 ? remainder + length_ : remainder;
-        return lifted >= length_ ? 0.0 : lifted;
-    }
+    double Lift(double remainder) const { return remainder < 0.0 ? remainder + length_ : remainder; }
 
     double length_, inverse_;
 };

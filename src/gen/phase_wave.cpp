@@ -16,7 +16,7 @@ namespace krnumer::HWY_NAMESPACE {
 
 constexpr double kPerHalfTurn = 0.005555555555555556;  // 1 / 180
 
-// `shape` gives the wave of amplitude 1 at a phase from 0 to 360 degrees.
+// `shape` gives the wave of amplitude 1 at a phase from 0 to 360 degrees, where it is the same as at 0.
 template <class Shape>
 int32_t PhaseDrivenWave(double* y, int32_t n, double amplitude, double frequency, double* phase, Shape shape) {
     if (n < 1) return kEmptyInput;
@@ -42,17 +42,24 @@ int32_t Sawtooth(double* y, int32_t n, double amplitude, double frequency, doubl
 }
 
 int32_t Triangle(double* y, int32_t n, double amplitude, double frequency, double* phase) {
-    return PhaseDrivenWave(y, n, amplitude, frequency, phase, [](double degrees) HWY_ATTR {
+    // Half the height: the loop saves a multiplication where the amplitude can be doubled before.
+    const auto half = [](double degrees) HWY_ATTR {
         const double half_turns = degrees * kPerHalfTurn;
-        const double after_peak = half_turns < 1.5 ? 1.0 - half_turns : half_turns - 2.0;
-        return 2.0 * (half_turns < 0.5 ? half_turns : after_peak);
-    });
+        const double about_zero = half_turns < 1.5 ? half_turns : half_turns - 2.0;
+        return about_zero < 0.5 ? about_zero : 1.0 - about_zero;
+    };
+    const double twice = 2.0 * amplitude;
+    if (std::isfinite(twice)) return PhaseDrivenWave(y, n, twice, frequency, phase, half);
+    return PhaseDrivenWave(y, n, amplitude, frequency, phase,
+                           [=](double degrees) HWY_ATTR { return 2.0 * half(degrees); });
 }
 
 int32_t Square(double* y, int32_t n, double amplitude, double frequency, double* phase, double duty) {
     const double edge = duty > 0.0 ? duty * 3.6 : 0.0;  // from 100 % on, every phase is below it
-    return PhaseDrivenWave(y, n, amplitude, frequency, phase,
-                           [=](double degrees) HWY_ATTR { return degrees < edge ? 1.0 : -1.0; });
+    return PhaseDrivenWave(y, n, amplitude, frequency, phase, [=](double degrees) HWY_ATTR {
+        const double turned = degrees >= kFullTurn ? 0.0 : degrees;
+        return turned < edge ? 1.0 : -1.0;
+    });
 }
 
 }  // namespace krnumer::HWY_NAMESPACE

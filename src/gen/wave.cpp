@@ -1,5 +1,6 @@
 #include "gen/wave.h"
 
+#include <algorithm>
 #include <cmath>
 
 #include "frame/numeric.h"
@@ -65,16 +66,27 @@ int32_t ArbitraryWave(double* y, int32_t n, double amplitude, double frequency, 
     const Period period(length);
     const double step = length * frequency;
     double position = *phase * length * kPerTurn;
-    for (int32_t i = 0; i < n; ++i, position += step) {
-        const double remainder = period.Remainder(position);
-        const double entry = remainder >= 0.0 ? remainder : 0.0;  // a position that is not finite reads the first entry
-        const int32_t before = TruncateToInt32(entry);
-        double value = table[before];
-        if (interpolation == 1) {
-            const int32_t after = before + 1 < table_size ? before + 1 : 0;
-            value += (entry - before) * (table[after] - value);
+    // One sample waits for another in the running sum only, so the rest is done for several side by side.
+    constexpr int32_t kBlock = 64;
+    double entries[kBlock];
+    for (int32_t done = 0, size; done < n; done += size) {
+        size = std::min(n - done, kBlock);
+        const double first = position;
+        for (int32_t i = 0; i < size; ++i, position += step) entries[i] = position;
+        const bool near = Period::IsNear(first) && Period::IsNear(position);
+        for (int32_t i = 0; i < size; ++i) {
+            const double entry = near ? period.NearRemainder(entries[i]) : period.Remainder(entries[i]);
+            entries[i] = entry < length ? entry : 0.0;  // NaN reads the first
         }
-        y[i] = value * amplitude;
+        for (int32_t i = 0; i < size; ++i) {
+            const int32_t before = static_cast<int32_t>(entries[i]);
+            double value = table[before];
+            if (interpolation == 1) {
+                const int32_t after = before + 1 < table_size ? before + 1 : 0;
+                value += (entries[i] - before) * (table[after] - value);
+            }
+            y[done + i] = value * amplitude;
+        }
     }
     *phase = kTurn.Remainder(kFullTurn / length * position);
     return kOk;

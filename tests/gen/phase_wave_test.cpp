@@ -190,12 +190,26 @@ TEST(TriangleWave, PeaksAtAQuarterAndAtThreeQuarters) {
     EXPECT_EQ(At(TriangleWave, -45.0), -0.5);
 }
 
+TEST(TriangleWave, ReachesTheLargestAmplitude) {
+    constexpr double kLargest = std::numeric_limits<double>::max();
+    for (const double amplitude : {kLargest, -kLargest, kLargest / 2.0, kInfinity}) {
+        double phase = -90.0;
+        auto y = Samples(36);
+        ASSERT_EQ(TriangleWave(y.data(), 36, amplitude, 0.125, &phase), kOk);
+        for (std::size_t i = 0; i < y.size(); i += 4) {
+            EXPECT_EQ(y[i], i % 8 == 0 ? -amplitude : amplitude);
+            EXPECT_EQ(y[i + 1], i % 8 == 0 ? -amplitude / 2.0 : amplitude / 2.0);
+        }
+    }
+}
+
 TEST(SquareWave, IsLowAtItsEdge) {
     EXPECT_EQ(At(Square(50.0), 0.0), 1.0);
     EXPECT_EQ(At(Square(50.0), std::nextafter(180.0, 0.0)), 1.0);
     EXPECT_EQ(At(Square(50.0), 180.0), -1.0);
     EXPECT_EQ(At(Square(50.0), 540.0), -1.0);
     EXPECT_EQ(At(Square(25.0), -270.0), -1.0);
+    EXPECT_EQ(At(Square(25.0), -1e-20), 1.0) << "a phase that rounds to 360 is one of 0";
 }
 
 TEST(SquareWave, TakesADutyOutsideItsRangeAsTheLimit) {
