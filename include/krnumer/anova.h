@@ -27,7 +27,8 @@
  * @param[out] msWithin   mean square within groups, over n - k
  * @param[out] ssTotal    total sum of squares
  * @param[out] err        status: 0; -20002 when the arrays differ in length; -20003 when they are empty; -20042 when
- * `k` is out of range; -20043 for a group out of range; -20044 for a group without observation; -20001 without memory
+ *                        `k` is out of range; -20043 for a group out of range; -20044 for a group without observation;
+ *                        -20001 without memory
  * @return                0
  */
 KRNUMER_API int32_t Anova1Way_head(KrHandle y, KrHandle levels, const int32_t* k, double* ssBetween, double* msBetween,
@@ -48,14 +49,14 @@ KRNUMER_API int32_t Anova1Way_head(KrHandle y, KrHandle levels, const int32_t* k
  * @param[in]  a        levels of A, at least 2 in magnitude; negative for a random factor
  * @param[in]  b        levels of B, likewise
  * @param[out] table    4 rows A, B, AB, error; columns sum of squares, degrees of freedom, mean square, F (0 for the
- * error)
+ *                      error)
  * @param[out] pA       probability of a larger F of A
  * @param[out] pB       probability of a larger F of B
  * @param[out] pAB      probability of a larger F of AB
  * @param[out] err      status: 0; -20002 when the arrays differ in length; -20001 when `table` cannot be sized, or
- * without memory; -20045 when a b r is not the length; -20042 for a factor of fewer than 2 levels; -20044 when `r` is
- * less than 1; -20043 for a level out of range; -20047 for a cell that does not hold `r`; -20048 for a random factor
- * with `r` 1. The first in this order counts
+ *                      without memory; -20045 when a b r is not the length; -20042 for a factor of fewer than 2 levels;
+ *                      -20044 when `r` is less than 1; -20043 for a level out of range; -20047 for a cell that does not
+ *                      hold `r`; -20048 for a random factor with `r` 1. The first in this order counts
  * @return              0
  */
 KRNUMER_API int32_t Anova2Way_head(KrHandle y, KrHandle levelsA, KrHandle levelsB, const int32_t* r, const int32_t* a,
@@ -76,7 +77,7 @@ KRNUMER_API int32_t Anova2Way_head(KrHandle y, KrHandle levelsA, KrHandle levels
  * @param[in]  b        levels of B, likewise
  * @param[in]  c        levels of C, likewise
  * @param[out] table    8 rows A, B, C, AB, AC, BC, ABC, error; columns sum of squares, degrees of freedom, mean square,
- * F (0 for the error)
+ *                      F (0 for the error)
  * @param[out] pA       probability of a larger F of A
  * @param[out] pB       probability of a larger F of B
  * @param[out] pC       probability of a larger F of C
@@ -85,9 +86,9 @@ KRNUMER_API int32_t Anova2Way_head(KrHandle y, KrHandle levelsA, KrHandle levels
  * @param[out] pBC      probability of a larger F of BC
  * @param[out] pABC     probability of a larger F of ABC
  * @param[out] err      status: 0; -20002 when the arrays differ in length; -20001 when `table` cannot be sized, or
- * without memory; -20045 when a b c r is not the length; -20044 when `r` is less than 2; -20042 for a factor of fewer
- * than 2 levels; -20043 for a level out of range; -20047 for a cell that does not hold `r`. The first in this order
- * counts
+ *                      without memory; -20045 when a b c r is not the length; -20044 when `r` is less than 2; -20042
+ *                      for a factor of fewer than 2 levels; -20043 for a level out of range; -20047 for a cell that
+ *                      does not hold `r`. The first in this order counts
  * @return              0
  */
 KRNUMER_API int32_t ANOVA3Way_head(KrHandle y, KrHandle levelsA, KrHandle levelsB, KrHandle levelsC, const int32_t* r,
@@ -105,7 +106,7 @@ KRNUMER_API int32_t ANOVA3Way_head(KrHandle y, KrHandle levelsA, KrHandle levels
  * @param[out] chiSquare  the statistic
  * @param[out] p          probability of a larger one
  * @param[out] err        status: 0; -20056 for a negative dimension; -20055 for fewer than 2 rows or columns; -20056
- * for a negative cell; -20001 without memory
+ *                        for a negative cell; -20001 without memory
  * @return                0
  */
 KRNUMER_API int32_t Contingency_head(KrHandle counts, double* chiSquare, double* p, int32_t* err);

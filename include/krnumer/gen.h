@@ -18,7 +18,7 @@
 /**
  * Sine, amplitude sin(2 pi frequency i + phase).
  *
- * By the two-step recurrence of sine and cosine from four trigonometric calls for the whole block, cut off at
+ * By the two-step recurrence of sine and cosine from five trigonometric calls for the whole block, cut off at
  * +-amplitude. Its rounding grows with the block, and with frequencies of many cycles per sample from the start.
  *
  * @param[out]    x          samples
@@ -243,7 +243,7 @@ KRNUMER_API int32_t AperiodTriangleH(KrHandle x, int32_t n, double amplitude, do
  * @param[in]     fc         centre frequency in hertz, above 0
  * @param[in]     amplitude  peak value
  * @return                   0; -20140 when `fc` is not positive; -20003 when `n` is less than 1; -20016 when `dt` is
- * not positive or `x` is not empty; the host's status when `x` cannot be sized
+ *                           not positive or `x` is not empty; the host's status when `x` cannot be sized
  */
 KRNUMER_API int32_t GaussMonopulseH(KrHandle x, int32_t n, double dt, double delay, double fc, double amplitude);
 
@@ -259,7 +259,8 @@ KRNUMER_API int32_t GaussMonopulseH(KrHandle x, int32_t n, double dt, double del
  * @param[in]     bandwidth    width of the band as a fraction of fc, above 0
  * @param[in]     attenuation  dB, above 0
  * @return                     0; -20140 when `fc`, `bandwidth` or `attenuation` is not positive; -20003 when `n` is
- * less than 1; -20016 when `dt` is not positive or `x` is not empty; the host's status when `x` cannot be sized
+ *                             less than 1; -20016 when `dt` is not positive or `x` is not empty; the host's status when
+ *                             `x` cannot be sized
  */
 KRNUMER_API int32_t GaussPulseH(KrHandle x, int32_t n, double amplitude, double delay, double dt, double fc,
                                 double bandwidth, double attenuation);

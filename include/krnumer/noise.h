@@ -64,7 +64,7 @@ KRNUMER_API int32_t white(KrHandle x, const int32_t* n, const double* amplitude,
  * @param[in]     sigma  standard deviation
  * @param[in]     seed   above 0 starts the sequence anew; from 0 on drops the spare
  * @param[out]    err    status: 0; -20003 when `n` is less than 1; -20001 when `x` cannot be sized; -20062 when a
- * million draws give no sample, which takes a state that is stuck
+ *                       million draws give no sample, which takes a state that is stuck
  * @param[in,out] state  random state
  * @param[in,out] spare  deviate left over
  * @return               0, or the host's status when `x` cannot be sized
@@ -81,7 +81,7 @@ KRNUMER_API int32_t Gauss(KrHandle x, const int32_t* n, const double* sigma, con
  * @param[in]     seed       above 0 starts the sequence anew
  * @param[out]    x          samples, 1-D double; emptied on failure
  * @param[out]    err        status: 0; -20003 when `n` is less than 1; -20001 without memory or when `x` cannot be
- * sized
+ *                           sized
  * @param[in,out] state      random state
  * @return                   0, or the host's status when `x` cannot be sized
  */
@@ -102,7 +102,7 @@ KRNUMER_API int32_t PeriodNoise(const int32_t* n, const double* amplitude, const
  * @param[in,out] state   random state
  * @param[in,out] cache   kept between calls
  * @return                0; -20061 when `trials` is negative or `p` outside 0 to 1 or NaN; -20003 when `n` is less than
- * 1; -20001 when `x` cannot be sized; -20062 when a million draws give no sample
+ *                        1; -20001 when `x` cannot be sized; -20062 when a million draws give no sample
  */
 KRNUMER_API int32_t BinomialNoiseH(KrHandle x, int32_t n, int32_t trials, double p, int32_t seed, KrRandomState* state,
                                    KrBinomialCache* cache);
@@ -119,7 +119,7 @@ KRNUMER_API int32_t BinomialNoiseH(KrHandle x, int32_t n, int32_t trials, double
  * @param[in]     seed   above 0 starts the sequence anew
  * @param[in,out] state  random state
  * @return               0; -20061 when `order` is less than 1; -20003 when `n` is less than 1; -20001 when `x` cannot
- * be sized; -20062 when a million draws give no sample, which takes a state that is stuck
+ *                       be sized; -20062 when a million draws give no sample, which takes a state that is stuck
  */
 KRNUMER_API int32_t GammaNoiseH(KrHandle x, int32_t n, int32_t order, int32_t seed, KrRandomState* state);
 
@@ -132,7 +132,7 @@ KRNUMER_API int32_t GammaNoiseH(KrHandle x, int32_t n, int32_t order, int32_t se
  * @param[in]     seed   above 0 starts the sequence anew
  * @param[in,out] state  random state
  * @return               0; -20061 when `mean` is below 0; -20003 when `n` is less than 1; -20001 when `x` cannot be
- * sized; -20062 when a million draws give no sample
+ *                       sized; -20062 when a million draws give no sample
  */
 KRNUMER_API int32_t PoissonNoiseH(KrHandle x, int32_t n, double mean, int32_t seed, KrRandomState* state);
 
@@ -145,7 +145,7 @@ KRNUMER_API int32_t PoissonNoiseH(KrHandle x, int32_t n, double mean, int32_t se
  * @param[in]     seed     above 0 starts the sequence anew
  * @param[in,out] state    random state
  * @return                 0; -20003 when `x` is empty; -20001 when `indices` cannot be sized. A positive status of the
- * host counts as success where `indices` is long enough as it came
+ *                         host counts as success where `indices` is long enough as it came
  */
 KRNUMER_API int32_t RiffleArrayDBL_head(KrHandle x, KrHandle indices, int32_t seed, KrRandomState* state);
 

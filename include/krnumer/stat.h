@@ -24,7 +24,7 @@ KRNUMER_API int32_t Mean_head(KrHandle x, double* mean, int32_t* err);
  * @param[in]  x       samples
  * @param[out] median  the median; NaN on failure
  * @param[out] err     status: 0; -20003 when `x` is empty; -20104 when a sample is NaN; -20001 without memory for a
- * copy
+ *                     copy
  * @return             0
  */
 KRNUMER_API int32_t Median_head(KrHandle x, double* median, int32_t* err);

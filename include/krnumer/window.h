@@ -61,8 +61,7 @@ KRNUMER_API int32_t ScaledGenCosWinH(KrHandle x, KrHandle coefficients);
 /** ScaledGenCosWinH of complex samples. */
 KRNUMER_API int32_t ScaledCxGenCosWinH(KrHandle x, KrHandle coefficients);
 
-/* ---- Windows of their own kinds -----------------------------------------------------------------------------------
- */
+/* ---- Windows of their own kinds ---------------------------------------------------------------------------------- */
 
 /**
  * Bartlett-Hanning window, w[i] = 0.62 - 0.48 |i/n - 0.5| - 0.38 cos(2 pi i / n), with w[0] = 0 (Y. H. Ha and
@@ -242,8 +241,8 @@ KRNUMER_API int32_t CxGaussWinH(KrHandle x, double sigma, int32_t symmetric);
  * 34, 335, 1946). The work grows as n^2.
  *
  * @param[in,out] x          samples
- * @param[in]     ratio      height of the main lobe over that of the side lobes; below 1, or NaN, means 1;
- * above 1.3e154 the weights are NaN
+ * @param[in]     ratio      height of the main lobe over that of the side lobes; below 1, or NaN, means 1; above
+ *                           1.3e154 the weights are NaN
  * @param[in]     symmetric  0: the symmetric window of n + 1 without its last weight; else the symmetric window
  * @return                   0; -20003 when `x` is empty; -20001 without memory for the weights
  */
@@ -252,8 +251,7 @@ KRNUMER_API int32_t DolChebyWinH(KrHandle x, double ratio, int32_t symmetric);
 /** DolChebyWinH of complex samples. */
 KRNUMER_API int32_t CxDolChebyWinH(KrHandle x, double ratio, int32_t symmetric);
 
-/* ---- Windows by number, and their constants
- * -------------------------------------------------------------------------- */
+/* ---- Windows by number, and their constants ---------------------------------------------------------------------- */
 
 /** A window's figures of merit in spectral measurements. */
 typedef struct KrWindowConstants {
