@@ -229,6 +229,7 @@ class TableReporter : public benchmark::ConsoleReporter {
             return std::any_of(std::begin(kLengths), std::end(kLengths),
                                [&](int32_t n) { return time(n, peer) > 0.0; });
         });
+        if (peers.empty()) return;
         std::printf("\n%-8s", kKindNames[kind]);
         for (const char* peer : peers) std::printf("%12s", (std::string(peer) + " ns").c_str());
         for (size_t p = 1; p < peers.size(); ++p) std::printf("%10s", (std::string("/") + peers[p]).c_str());
@@ -249,7 +250,7 @@ class TableReporter : public benchmark::ConsoleReporter {
             }
             std::printf("%14.3f\n", own / (n * std::log2(n)));
         }
-        if (lengths == 0) return;
+        if (lengths == 0 || peers.size() == 1) return;
         std::printf("%-*s", static_cast<int>(8 + 12 * peers.size()), "geometric mean");
         for (size_t p = 1; p < peers.size(); ++p) std::printf("%10.2f", std::exp(logarithms[p] / lengths));
         std::printf("\n");

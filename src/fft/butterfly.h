@@ -79,9 +79,9 @@ void StageOfComplex(double* re, double* im, const double* twiddle_re, const doub
 }
 
 template <int r>
-void RowsOfReal(double* data, const double* twiddle_re, const double* twiddle_im, int32_t m, int32_t k) {
+void RowsOfReal(double* data, const double* twiddle_re, const double* twiddle_im, int32_t m, int32_t k, int32_t end) {
     Complex t[r];
-    CombineRealRows(GeneratedKernel<r>(), t, data, {twiddle_re, twiddle_im}, 1, m, k);
+    CombineRealRows(GeneratedKernel<r>(), t, data, {twiddle_re, twiddle_im}, 1, m, k, end);
 }
 
 template <int r>

@@ -7,6 +7,9 @@
 
 namespace krnumer {
 
+// The vector kernels of stages want adjacent elements, and twiddles that are packed row after row; those of stages that
+// run in tiles are in another order.
+
 int32_t RunRealLeaf(const qmfft_table* table, int32_t i, const double* in, double* out, int32_t in_stride,
                     int32_t out_stride, int32_t how_many) {
     const int32_t r = table->factors[i];
@@ -26,10 +29,10 @@ int32_t RunRealStage(const qmfft_table* table, int32_t i, double* data, int32_t 
     const stage_tables& stage = *table->stages[i];
     switch (table->kinds[i]) {
         case kButterfly:
-            if (stride == 1 && table->vectors[i] != nullptr) {
+            if (stride == 1 && table->vectors[i] != nullptr && i >= table->tiledReal) {
                 table->realLeaf[i](data, data, m, m, 1);  // row 0
                 const int32_t k = table->vectors[i]->real.stage(data, stage.packedReal, m);
-                if (2 * k <= m) ButterfliesOf(r)->real_rows(data, stage.twiddleRe, stage.twiddleIm, m, k);
+                if (2 * k <= m) ButterfliesOf(r)->real_rows(data, stage.twiddleRe, stage.twiddleIm, m, k, m);
             } else {
                 table->realStage[i](data, stage.twiddleRe, stage.twiddleIm, stride, m);
             }
@@ -62,8 +65,8 @@ int32_t RunComplexStage(const qmfft_table* table, int32_t i, double* re, double*
     const stage_tables& stage = *table->stages[i];
     switch (table->kinds[i]) {
         case kButterfly:
-            if (im == re + 1 && stride == 2 && table->vectors[i] != nullptr) {
-                table->vectors[i]->complex.stage(reinterpret_cast<Complex*>(re), stage.packedComplex, m);
+            if (im == re + 1 && stride == 2 && table->vectors[i] != nullptr && i >= table->tiledComplex) {
+                table->vectors[i]->complex.stage(reinterpret_cast<Complex*>(re), m, stage.packedComplex, m, true);
             } else {
                 table->cplxStage[i](re, im, stage.twiddleRe, stage.twiddleIm, stride, m);
             }

@@ -62,13 +62,14 @@ KRNUMER_FFT_INLINE int32_t NyquistStep(const Kernel& kernel, Complex* t, double*
     return kOk;
 }
 
-// Combines rows of r half-complex blocks of length m in place, from row k >= 1 on. `t` holds r values.
+// Combines rows of r half-complex blocks of length m in place, from row k >= 1 to before row `end`, with their
+// partners. `t` holds r values.
 template <class Kernel>
 KRNUMER_FFT_INLINE int32_t CombineRealRows(const Kernel& kernel, Complex* t, double* data, Twiddles w, ptrdiff_t stride,
-                                           int32_t m, int32_t k) {
-    for (; k <= (m - 1) / 2; ++k)
+                                           int32_t m, int32_t k, int32_t end) {
+    for (; k < end && k <= (m - 1) / 2; ++k)
         if (const int32_t status = PairStep(kernel, t, data, w, stride, m, k)) return status;
-    return k == m / 2 ? NyquistStep(kernel, t, data, w, stride, m) : kOk;
+    return k < end && k == m / 2 ? NyquistStep(kernel, t, data, w, stride, m) : kOk;
 }
 
 // Combines r half-complex blocks of length m in place. `t` holds r values.
@@ -76,7 +77,7 @@ template <class Kernel>
 KRNUMER_FFT_INLINE int32_t CombineReal(const Kernel& kernel, Complex* t, double* data, Twiddles w, ptrdiff_t stride,
                                        int32_t m) {
     if (const int32_t status = kernel.TransformReal(data, stride * m)) return status;
-    return CombineRealRows(kernel, t, data, w, stride, m, 1);
+    return CombineRealRows(kernel, t, data, w, stride, m, 1, m);
 }
 
 // Combines r complex blocks of length m in place. `t` holds r values.

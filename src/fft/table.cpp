@@ -8,6 +8,7 @@
 #include <type_traits>
 
 #include "fft/rader.h"
+#include "fft/vector_tiles.h"
 #include "fft/vector_transform.h"
 #include "frame/numeric.h"
 
@@ -95,13 +96,14 @@ bool BuildTwiddles(stage_tables* stage, int32_t radix, int32_t m) {
     return true;
 }
 
-bool PackTwiddles(stage_tables* stage, int32_t radix, int32_t m) {
-    if (!Allocate(&stage->packedComplex, PackedCountOfComplex(radix, m)) ||
-        !Allocate(&stage->packedReal, PackedCountOfReal(radix, m))) {
+bool PackTwiddles(const qmfft_table* table, int32_t i, int32_t m) {
+    stage_tables* stage = table->stages[i];
+    if (!Allocate(&stage->packedComplex, CountStageTwiddles<Complex>(table, i, m)) ||
+        !Allocate(&stage->packedReal, CountStageTwiddles<double>(table, i, m))) {
         return false;
     }
-    PackComplexTwiddles(stage->twiddleRe, stage->twiddleIm, radix, m, stage->packedComplex);
-    PackRealTwiddles(stage->twiddleRe, stage->twiddleIm, radix, m, stage->packedReal);
+    PackStageTwiddles<Complex>(table, i, m, stage->packedComplex);
+    PackStageTwiddles<double>(table, i, m, stage->packedReal);
     return true;
 }
 
@@ -127,11 +129,13 @@ bool BuildStages(qmfft_table* table) {
         table->stages[i] = static_cast<stage_tables*>(std::calloc(1, sizeof(stage_tables)));
         if (table->stages[i] == nullptr) return false;
     }
+    table->tiledComplex = CountTiledFactors<Complex>(table);
+    table->tiledReal = CountTiledFactors<double>(table);
     int32_t m = table->length;
     for (int32_t i = 0; i < table->factorCount - 1; ++i) {
         m /= table->factors[i];
         if (!BuildTwiddles(table->stages[i], table->factors[i], m)) return false;
-        if (table->vectors[i] != nullptr && !PackTwiddles(table->stages[i], table->factors[i], m)) return false;
+        if (table->vectors[i] != nullptr && !PackTwiddles(table, i, m)) return false;
     }
     for (int32_t i = 0; i < table->factorCount; ++i) {
         if (table->kinds[i] == kDirect && !BuildDirect(table->stages[i], table->factors[i])) return false;

@@ -35,8 +35,9 @@ struct Butterflies {
     RealStage real_stage;
     ComplexLeaf complex_leaf;
     ComplexStage complex_stage;
-    // What real_stage does from row k >= 1 on, at stride 1.
-    void (*real_rows)(double* data, const double* twiddle_re, const double* twiddle_im, int32_t m, int32_t k);
+    // What real_stage does with rows k >= 1 to before `end`, and with their partners, at stride 1.
+    void (*real_rows)(double* data, const double* twiddle_re, const double* twiddle_im, int32_t m, int32_t k,
+                      int32_t end);
 };
 
 // The butterflies of a radix, null where it has none.
@@ -74,6 +75,8 @@ struct qmfft_table {
     qmfft_table* prev;
     qmfft_table* next;
     const krnumer::VectorButterflies* vectors[krnumer::kMaxFactors];  // null where there are none
+    int32_t tiledComplex;  // how many of the first factors have their stages run in tiles
+    int32_t tiledReal;
 };
 
 namespace krnumer {

@@ -188,40 +188,41 @@ KRNUMER_FFT_INLINE void TransformRows(double* x, ptrdiff_t block, const double* 
         [&](int q, Columns value) KRNUMER_FFT_INLINE_LAMBDA { hn::StoreU(value.v, d, x + q * block); });
 }
 
-// Fewer rows than a vector of N holds, from row k on, in shorter vectors.
+// Fewer rows than a vector of N holds, in shorter vectors.
 template <int r, size_t N>
-KRNUMER_FFT_NOINLINE void TransformLastRows(double* x, ptrdiff_t block, const double* packed, int32_t k, int32_t m) {
+KRNUMER_FFT_NOINLINE void TransformLastRows(double* x, ptrdiff_t block, const double* packed, int32_t rows,
+                                            bool from_row0) {
     if constexpr (N > 2) {
         constexpr size_t kWidth = kNextWidth<r, N>;
         constexpr int32_t kRows = kColumns<Complex, kWidth>;
-        for (; k + kRows <= m; k += kRows, packed += kWidth) {
-            if (k == 0) {
+        for (; rows >= kRows; rows -= kRows, packed += kWidth, x += kWidth) {
+            if (from_row0) {
                 TransformRows<r, kWidth, true>(x, block, packed);
             } else {
-                TransformRows<r, kWidth, false>(x + 2 * k, block, packed);
+                TransformRows<r, kWidth, false>(x, block, packed);
             }
+            from_row0 = false;
         }
-        if (k < m) TransformLastRows<r, kWidth>(x, block, packed, k, m);
+        if (rows > 0) TransformLastRows<r, kWidth>(x, block, packed, rows, from_row0);
     }
 }
 
 template <int r>
-int32_t ComplexStage(Complex* data, const double* packed, int32_t m) {
-    constexpr int32_t kWidth = kColumns<Complex, kLanes>;
+void ComplexStage(Complex* data, ptrdiff_t block, const double* packed, int32_t rows, bool from_row0) {
+    constexpr int32_t kRows = kColumns<Complex, kLanes>;
     constexpr ptrdiff_t kPacked = ptrdiff_t{r - 1} * ptrdiff_t{kLanes};
     double* x = &data->re;
-    const ptrdiff_t block = 2 * ptrdiff_t{m};
-    int32_t k = 0;
-    if (kWidth <= m) {
+    block *= 2;
+    if (from_row0 && rows >= kRows) {
         TransformRows<r, kLanes, true>(x, block, packed);
-        for (k = kWidth; k + kWidth <= m; k += kWidth) {
-            packed += kPacked;
-            TransformRows<r, kLanes, false>(x + 2 * k, block, packed);
-        }
+        rows -= kRows;
         packed += kPacked;
+        x += kLanes;
+        from_row0 = false;
     }
-    if (k < m) TransformLastRows<r, kLanes>(x, block, packed, k, m);
-    return m;
+    for (; rows >= kRows; rows -= kRows, packed += kPacked, x += kLanes)
+        TransformRows<r, kLanes, false>(x, block, packed);
+    if (rows > 0) TransformLastRows<r, kLanes>(x, block, packed, rows, from_row0);
 }
 
 // How much of a vector is there: all of it, or some lanes by a mask. Vectors of two doubles have no part.
@@ -308,9 +309,31 @@ int32_t RealStage(double* data, const double* packed, int32_t m) {
     return k;
 }
 
+// Rows a, a+1, ... of a real stage with their partners b, b+1, ..., which were put in this order before.
+template <int r>
+void RealPairs(double* a, double* b, ptrdiff_t block, const double* packed, int32_t pairs) {
+    using Columns = SplitColumns<kLanes>;
+    const Tag<kLanes> d;
+    for (; pairs > 0; pairs -= static_cast<int32_t>(kLanes), a += kLanes, b += kLanes) {
+        DftOfColumns<r, Columns>(
+            [&](int j) KRNUMER_FFT_INLINE_LAMBDA {
+                const Columns value{{hn::LoadU(d, a + j * block)}, {hn::LoadU(d, b + j * block)}};
+                if (j == 0) return value;
+                const double* w = packed + (j - 1) * 2 * ptrdiff_t{kLanes};
+                return Rotate(value, Columns{{hn::LoadU(d, w)}, {hn::LoadU(d, w + kLanes)}});
+            },
+            [&](int q, Columns value) KRNUMER_FFT_INLINE_LAMBDA {
+                const bool lower = 2 * q < r;
+                hn::StoreU(lower ? value.re.v : hn::Neg(value.im.v), d, a + q * block);
+                hn::StoreU(lower ? value.im.v : value.re.v, d, b + (r - 1 - q) * block);
+            });
+        packed += 2 * ptrdiff_t{r - 1} * ptrdiff_t{kLanes};
+    }
+}
+
 template <int r>
 inline constexpr VectorButterflies kVectorButterflies{{Columns<r, Complex>, ComplexStage<r>},
-                                                      {Columns<r, double>, RealStage<r>}};
+                                                      {Columns<r, double>, RealStage<r>, RealPairs<r>}};
 
 #endif  // KRNUMER_FFT_HAS_VECTORS
 

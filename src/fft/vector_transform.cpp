@@ -4,9 +4,12 @@
 #include <type_traits>
 
 #include "fft/factor.h"
+#include "fft/vector_tiles.h"
+#include "fft/vector_twiddles.h"
 #include "frame/complex.h"
 #include "frame/numeric.h"
 #include "frame/status.h"
+#include "hwy/cache_control.h"
 
 namespace krnumer {
 namespace {
@@ -71,6 +74,13 @@ class Places {
     int32_t digit_[kMaxFactors + 1];
 };
 
+// Fetches samples that are far apart before they are read.
+template <class T>
+void PrefetchLanes(const T* in, ptrdiff_t step, int32_t count, int32_t lanes) {
+    for (int32_t j = 0; j < count; ++j, in += step)
+        for (int32_t l = 0; l < lanes; l += kGroup<T>) hwy::Prefetch(in + l);
+}
+
 // The factors from i on, of `lanes` neighbouring sub-sequences of length n; their samples are `step` apart.
 template <class T>
 int32_t TransformLanes(const qmfft_table* table, int32_t i, int32_t n, const T* in, ptrdiff_t step, T* out,
@@ -81,7 +91,9 @@ int32_t TransformLanes(const qmfft_table* table, int32_t i, int32_t n, const T* 
         return kOk;
     }
     const int32_t m = n / r;
+    const bool far_apart = i == table->factorCount - 2 && TiledFactors<T>(table) > 0;
     for (int32_t b = 0; b < r; ++b) {
+        if (far_apart && b + 1 < r) PrefetchLanes(in + (b + 1) * step, r * step, m, lanes);
         if (const int32_t status =
                 TransformLanes(table, i + 1, m, in + b * step, r * step, out + ptrdiff_t{b} * m, places, lanes)) {
             return status;
@@ -103,11 +115,15 @@ int32_t Transform(const qmfft_table* table, const T* in, T* out) {
         return kOk;
     }
     const bool cached = Count(n) * sizeof(T) <= kCachedBytes;
+    const int32_t tiled = TiledFactors<T>(table);
     int32_t depth = 0;
     int32_t sequences = 1;
-    while (depth < last && (cached || sequences < kGroup<T>)) sequences *= table->factors[depth++];
+    while (depth < last && (tiled > 0 ? depth < tiled : cached || sequences < kGroup<T>))
+        sequences *= table->factors[depth++];
 
-    const int32_t together = cached ? kMostTogether : kGroup<T>;
+    const int32_t together = tiled > 0 ? std::min(LanesBeforeTiles<T>(n / sequences), kMostTogether)
+                             : cached  ? kMostTogether
+                                       : kGroup<T>;
     Places next(table, depth);
     for (int32_t start = 0; start < sequences; start += together) {
         const int32_t lanes = std::min(together, sequences - start);
@@ -117,6 +133,10 @@ int32_t Transform(const qmfft_table* table, const T* in, T* out) {
                 TransformLanes(table, depth, n / sequences, in + start, sequences, out, places, lanes)) {
             return status;
         }
+    }
+    if (tiled > 0) {
+        CombineInTiles(table, out);
+        return kOk;
     }
     int32_t length = n / sequences;
     for (int32_t i = depth; i-- > 0;) {
@@ -128,26 +148,14 @@ int32_t Transform(const qmfft_table* table, const T* in, T* out) {
     return kOk;
 }
 
-// Vectors of `lanes` rows from row `first` up to before row `end`.
-int32_t VectorCount(int32_t first, int32_t end, int32_t lanes) {
-    return (end - first + lanes - 1) / lanes;
-}
+// The rows that a stage of blocks of length m takes, as the kernels take them: those of a real stage bring the rest
+// with them, and row 0 takes no twiddles.
+template <class T>
+constexpr int32_t kFirstRow = std::is_same_v<T, Complex> ? 0 : 1;
 
-// Calls store(vector, column j, lane, w) for all that is packed.
-template <class Store>
-void ForEachTwiddle(const double* re, const double* im, int32_t radix, int32_t first, int32_t end, int32_t lanes,
-                    Store store) {
-    const ptrdiff_t columns = radix - 1;
-    const int32_t vectors = VectorCount(first, end, lanes);
-    for (int32_t v = 0; v < vectors; ++v) {
-        for (ptrdiff_t j = 0; j < columns; ++j) {
-            for (int32_t l = 0; l < lanes; ++l) {
-                const ptrdiff_t k = first + ptrdiff_t{v} * lanes + l;
-                const ptrdiff_t at = (k - 1) * columns + j;
-                store(v * columns + j, l, k > 0 && k < end ? Complex{re[at], im[at]} : Complex{1.0, 0.0});
-            }
-        }
-    }
+template <class T>
+int32_t LastRow(int32_t m) {
+    return std::is_same_v<T, Complex> ? m - 1 : m / 2;
 }
 
 }  // namespace
@@ -164,32 +172,25 @@ int32_t VectorRealFFT(const qmfft_table* table, const double* in, double* out) {
     return Transform(table, in, out);
 }
 
-size_t PackedCountOfComplex(int32_t radix, int32_t m) {
-    const int32_t lanes = VectorLanes();
-    return Count(VectorCount(0, m, lanes / 2)) * Count(radix - 1) * Count(lanes);
+template <class T>
+size_t CountStageTwiddles(const qmfft_table* table, int32_t i, int32_t m) {
+    if (i < TiledFactors<T>(table)) return PackedCountInTiles<T>(table, i);
+    return PackedCount<T>(LastRow<T>(m) + 1 - kFirstRow<T>, table->factors[i]);
 }
 
-void PackComplexTwiddles(const double* re, const double* im, int32_t radix, int32_t m, double* packed) {
-    const int32_t lanes = VectorLanes();
-    ForEachTwiddle(re, im, radix, 0, m, lanes / 2, [&](ptrdiff_t vector, int32_t lane, Complex w) {
-        double* at = packed + vector * lanes + 2 * lane;
-        at[0] = w.re;
-        at[1] = w.im;
-    });
+template <class T>
+void PackStageTwiddles(const qmfft_table* table, int32_t i, int32_t m, double* packed) {
+    if (i < TiledFactors<T>(table)) {
+        PackTwiddlesInTiles<T>(table, i, packed);
+    } else {
+        const auto row = [](int32_t k) { return k; };
+        PackTwiddles<T>(*table->stages[i], table->factors[i], kFirstRow<T>, LastRow<T>(m) + 1, row, packed);
+    }
 }
 
-size_t PackedCountOfReal(int32_t radix, int32_t m) {
-    const int32_t lanes = VectorLanes();
-    return Count(VectorCount(1, m / 2 + 1, lanes)) * Count(radix - 1) * Count(2 * lanes);
-}
-
-void PackRealTwiddles(const double* re, const double* im, int32_t radix, int32_t m, double* packed) {
-    const int32_t lanes = VectorLanes();
-    ForEachTwiddle(re, im, radix, 1, m / 2 + 1, lanes, [&](ptrdiff_t vector, int32_t lane, Complex w) {
-        double* at = packed + vector * 2 * lanes + lane;
-        at[0] = w.re;
-        at[lanes] = w.im;
-    });
-}
+template size_t CountStageTwiddles<Complex>(const qmfft_table*, int32_t, int32_t);
+template size_t CountStageTwiddles<double>(const qmfft_table*, int32_t, int32_t);
+template void PackStageTwiddles<Complex>(const qmfft_table*, int32_t, int32_t, double*);
+template void PackStageTwiddles<double>(const qmfft_table*, int32_t, int32_t, double*);
 
 }  // namespace krnumer

@@ -1,0 +1,40 @@
+// Transforms that outgrow the caches. The stages of their first factors combine rows that are far apart; they are run
+// in tiles, some columns of many rows, which are copied out of the data and back: the data are gone through once for
+// several stages, and rows at distances of powers of two do not drive each other out.
+#pragma once
+
+#include <cstddef>
+#include <cstdint>
+#include <type_traits>
+
+#include "fft/table.h"
+#include "frame/complex.h"
+
+namespace krnumer {
+
+// How many of the first factors have their stages run in tiles on elements T, Complex or double. The table's factors
+// and kernels must stand; 0 where the data stay in the cache anyway or a factor lacks vector kernels.
+template <class T>
+int32_t CountTiledFactors(const qmfft_table* table);
+
+template <class T>
+int32_t TiledFactors(const qmfft_table* table) {
+    return std::is_same_v<T, Complex> ? table->tiledComplex : table->tiledReal;
+}
+
+// How many neighbouring sub-sequences of `length` elements are transformed together before: as many as the cache holds.
+template <class T>
+int32_t LanesBeforeTiles(int32_t length);
+
+// Runs these stages in place. The sub-sequences of all other factors are done.
+template <class T>
+void CombineInTiles(const qmfft_table* table, T* data);
+
+// Twiddles of such a factor i in the order of the tiles: tile after tile, in each the rows of one column after the
+// other as the stage takes them, in vectors as elsewhere. What is behind the last column is 1.
+template <class T>
+size_t PackedCountInTiles(const qmfft_table* table, int32_t i);
+template <class T>
+void PackTwiddlesInTiles(const qmfft_table* table, int32_t i, double* packed);
+
+}  // namespace krnumer
