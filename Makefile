@@ -9,7 +9,7 @@ BUILD = build/$(PRESET)
 .PHONY: help build test demo docs bench format lint install package clean
 
 help:
-	@echo "make test      build and run the whole suite      make demo      report on a recorded signal"
+	@echo "make test      build and run the whole suite      make demo      report on recorded signals"
 	@echo "make docs      reference as HTML                   make bench     measure beside the peers"
 	@echo "make format    clang-format everything             make lint      clang-format and clang-tidy checks"
 	@echo "make install   into PREFIX=$(PREFIX)           make package   Debian packages"

@@ -10,9 +10,10 @@
 
 // One curve of a plot.
 struct Series {
-    std::string kind;  // "line", "points", "columns", or "mark", a vertical line at each x
+    std::string kind;  // "line", "points", "columns", "band" from y to upper, or "mark", a vertical line at each x
     std::string name;
     std::vector<double> x, y;
+    std::vector<double> upper = {};
 };
 
 // Samples at the equal distance `step` from `start` on.
@@ -20,6 +21,8 @@ Series Line(const std::string& name, std::span<const double> samples, double ste
 Series Line(const std::string& name, std::span<const double> x, std::span<const double> y);
 Series Points(const std::string& name, std::span<const double> x, std::span<const double> y);
 Series Columns(const std::string& name, std::span<const double> centers, std::span<const int32_t> counts);
+Series Band(const std::string& name, std::span<const double> x, std::span<const double> lower,
+            std::span<const double> upper);
 Series Mark(const std::string& name, double x);
 
 struct Plot {

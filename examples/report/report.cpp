@@ -8,7 +8,7 @@
 #include <sstream>
 #include <stdexcept>
 
-NLOHMANN_DEFINE_TYPE_NON_INTRUSIVE(Series, kind, name, x, y)
+NLOHMANN_DEFINE_TYPE_NON_INTRUSIVE(Series, kind, name, x, y, upper)
 NLOHMANN_DEFINE_TYPE_NON_INTRUSIVE(Plot, title, x_label, y_label, series)
 NLOHMANN_DEFINE_TYPE_NON_INTRUSIVE(Value, name, value, unit)
 NLOHMANN_DEFINE_TYPE_NON_INTRUSIVE(Table, title, columns, rows)
@@ -31,6 +31,11 @@ Series Points(const std::string& name, std::span<const double> x, std::span<cons
 
 Series Columns(const std::string& name, std::span<const double> centers, std::span<const int32_t> counts) {
     return {"columns", name, {centers.begin(), centers.end()}, {counts.begin(), counts.end()}};
+}
+
+Series Band(const std::string& name, std::span<const double> x, std::span<const double> lower,
+            std::span<const double> upper) {
+    return {"band", name, {x.begin(), x.end()}, {lower.begin(), lower.end()}, {upper.begin(), upper.end()}};
 }
 
 Series Mark(const std::string& name, double x) {

@@ -75,3 +75,28 @@ class Records {
     KrHandle handle_;
     std::size_t count_;
 };
+
+// A matrix of doubles, row after row.
+class Matrix {
+  public:
+    explicit Matrix(std::size_t rows = 0, std::size_t columns = 0)
+        : handle_(KrrtNewMatrix(KRRT_DOUBLE, static_cast<int32_t>(rows), static_cast<int32_t>(columns))) {
+        if (handle_ == nullptr) throw std::bad_alloc();
+    }
+    Matrix(const Matrix&) = delete;
+    Matrix& operator=(const Matrix&) = delete;
+    ~Matrix() { KrrtFree(handle_); }
+
+    KrHandle handle() const { return handle_; }
+    std::size_t rows() const { return static_cast<std::size_t>(KrrtSize(handle_, 0)); }
+    std::size_t columns() const { return static_cast<std::size_t>(KrrtSize(handle_, 1)); }
+
+    // Valid until a call resizes the matrix.
+    std::span<double> Row(std::size_t i) {
+        return {static_cast<double*>(KrrtElements(handle_)) + i * columns(), columns()};
+    }
+    std::span<const double> Row(std::size_t i) const { return const_cast<Matrix*>(this)->Row(i); }
+
+  private:
+    KrHandle handle_;
+};
