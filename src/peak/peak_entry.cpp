@@ -93,7 +93,7 @@ int32_t Detect(const KrPeakRecord& record, const In<double>& samples, KrPeakStat
     double* const history = window + width;
     double* const previous = history + width;
     if (first_block) {
-        if (const int32_t status = DesignPeakWeights(record.width, weights)) return status;
+        if (const int32_t status = DesignParabolaWeights(record.width, weights)) return status;
         std::fill_n(previous, 3, 0.0);
     }
     PeakScan scan{.width = state->width,

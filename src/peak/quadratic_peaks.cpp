@@ -1,44 +1,21 @@
 #include "peak/quadratic_peaks.h"
 
 #include <algorithm>
+#include <bit>
 #include <cmath>
 #include <cstring>
 
 #include "frame/numeric.h"
 #include "frame/status.h"
-#include "linalg/svd_solve.h"
 
 namespace krnumer {
 
 namespace {
 
-constexpr double kLeastSlope = 1e-10;
 constexpr double kLeastCurvature = 1e-10;
 
 // Below this width a sign change of the slope says too little, and the curvature alone decides.
 constexpr int32_t kLeastWidthOfSlopes = 5;
-
-// Neighbouring windows, fitted together.
-constexpr int kBatch = 16;
-
-// Fits kWindows windows that start at x, x + 1 and so on. Every sum runs in the order of the samples.
-template <int kWindows>
-void Fit(const double* weights, int32_t width, const double* x, Parabola* parabolas) {
-    double a0[kWindows] = {}, a1[kWindows] = {}, a2[kWindows] = {};
-    const auto w = Count(width);
-    for (size_t j = 0; j < w; ++j) {
-        for (size_t k = 0; k < kWindows; ++k) {
-            a0[k] += weights[j] * x[j + k];
-            a1[k] += weights[w + j] * x[j + k];
-            a2[k] += weights[2 * w + j] * x[j + k];
-        }
-    }
-    for (int k = 0; k < kWindows; ++k) parabolas[k] = {a0[k], a1[k], a2[k]};
-}
-
-bool IsRising(const Parabola& parabola) {
-    return std::fabs(parabola.a1) <= kLeastSlope ? parabola.a2 > 0.0 : parabola.a1 > 0.0;
-}
 
 double Vertex(const Parabola& parabola) {
     return -parabola.a1 / (2.0 * parabola.a2);
@@ -49,34 +26,42 @@ class Scan {
     Scan(PeakScan* state, const PeakCriteria& criteria, PeakList* peaks)
         : state_(*state), criteria_(criteria), peaks_(*peaks), half_(0.5 * (state->width - 1)) {}
 
-    // Looks at the next window.
-    int32_t Take(const Parabola& parabola) {
-        const bool rising = IsRising(parabola);
-        int32_t status = kOk;
-        if (IsCandidate(parabola, rising)) status = Judge(parabola);
-        state_.rising = rising;
-        state_.previous = parabola;
-        ++state_.processed;
-        return status;
+    // Looks at the next windows, one or more.
+    int32_t Take(const ParabolaFits& fits, int32_t count) {
+        for (uint64_t candidates = Candidates(fits, count); candidates != 0; candidates &= candidates - 1) {
+            const int32_t k = std::countr_zero(candidates);
+            const Parabola previous = k > 0 ? fits[k - 1] : state_.previous;
+            const uint32_t position = state_.processed + static_cast<uint32_t>(k);
+            if (const int32_t status = Judge(fits[k], previous, position)) return status;
+        }
+        state_.rising = fits.IsRising(count - 1);
+        state_.previous = fits[count - 1];
+        state_.processed += static_cast<uint32_t>(count);
+        return kOk;
     }
 
   private:
-    bool IsCandidate(const Parabola& parabola, bool rising) const {
-        if (state_.width >= kLeastWidthOfSlopes) return rising != state_.rising;
-        return IsBentRight(parabola);
+    // A bit for each window: where the slope has another sign than in the window before, or where the bend is right.
+    uint64_t Candidates(const ParabolaFits& fits, int32_t count) const {
+        if (state_.width >= kLeastWidthOfSlopes) {
+            const uint64_t all = ~uint64_t{0} >> (ParabolaFits::kMost - count);
+            return (fits.rising ^ (fits.rising << 1 | (state_.rising ? 1 : 0))) & all;
+        }
+        uint64_t bent_right = 0;
+        for (int32_t k = 0; k < count; ++k) bent_right |= uint64_t{IsBentRight(fits[k])} << k;
+        return bent_right;
     }
 
     bool IsBentRight(const Parabola& parabola) const {
         return criteria_.valleys ? parabola.a2 > 0.0 : parabola.a2 < 0.0;
     }
 
-    int32_t Judge(Parabola parabola) {
+    // A window that begins at `position` of the signal.
+    int32_t Judge(Parabola parabola, const Parabola& previous, double position) {
         if (std::fabs(2.0 * parabola.a2) < kLeastCurvature) return kOk;
         double vertex = Vertex(parabola);
-        double position = state_.processed;
-        if (state_.processed > 0 && vertex < -0.5) {
+        if (position > 0.0 && vertex < -0.5) {
             // nearer to the middle of the window before, perhaps
-            const Parabola& previous = state_.previous;
             if (2.0 * previous.a2 == 0.0) return kOk;
             const double previous_vertex = Vertex(previous);
             if (std::fabs(previous_vertex) < std::fabs(vertex)) {
@@ -120,18 +105,6 @@ bool PeakList::Append(const Peak& peak) {
     return true;
 }
 
-int32_t DesignPeakWeights(int32_t width, double* weights) {
-    const double half = 0.5 * (width - 1);
-    for (int32_t i = 0; i < width; ++i) {
-        const double x = i - half;
-        double* const row = weights + 3 * Count(i);
-        row[0] = 1.0;
-        row[1] = x;
-        row[2] = x * x;
-    }
-    return PseudoInverseCore<double>(weights, width, 3, -1.0, nullptr);
-}
-
 int32_t FindQuadraticPeaks(PeakScan* state, const double* x, int32_t n, const PeakCriteria& criteria, bool last_block,
                            PeakList* peaks) {
     const int32_t width = state->width;
@@ -143,29 +116,25 @@ int32_t FindQuadraticPeaks(PeakScan* state, const double* x, int32_t n, const Pe
     const int32_t count = n - missing;
 
     Scan scan(state, criteria, peaks);
-    Parabola parabolas[kBatch];
+    ParabolaFits fits;
     if (state->processed == 0) {
-        Fit<1>(state->weights, width, state->history, parabolas);
-        state->rising = IsRising(parabolas[0]);
+        FitParabolas(state->weights, width, state->history, 1, &fits);
+        state->rising = fits.IsRising(0);
     }
     // Window i starts i samples into the history with the new samples behind it.
     const int64_t windows = int64_t{count} + (last_block ? 1 : 0);
     for (int64_t i = 0; i < windows;) {
-        int fitted = 1;
+        int32_t fitted = 1;
         if (i < width) {
             const auto begin = static_cast<int32_t>(i);
             std::copy_n(state->history + begin, width - begin, state->window);
             std::copy_n(fresh, begin, state->window + (width - begin));
-            Fit<1>(state->weights, width, state->window, parabolas);
-        } else if (windows - i < kBatch) {
-            Fit<1>(state->weights, width, fresh + (i - width), parabolas);
+            FitParabolas(state->weights, width, state->window, 1, &fits);
         } else {
-            fitted = kBatch;
-            Fit<kBatch>(state->weights, width, fresh + (i - width), parabolas);
+            fitted = static_cast<int32_t>(std::min<int64_t>(windows - i, ParabolaFits::kMost));
+            FitParabolas(state->weights, width, fresh + (i - width), fitted, &fits);
         }
-        for (int k = 0; k < fitted; ++k) {
-            if (const int32_t status = scan.Take(parabolas[k])) return status;
-        }
+        if (const int32_t status = scan.Take(fits, fitted)) return status;
         i += fitted;
     }
 

@@ -6,6 +6,7 @@
 
 #include "frame/numeric.h"
 #include "frame/scratch.h"
+#include "peak/parabola_fit.h"
 
 namespace krnumer {
 
@@ -30,11 +31,6 @@ class PeakList {
     int32_t count_ = 0;
 };
 
-// Least-squares parabola a0 + a1 x + a2 x^2, x = 0 in the middle of its window.
-struct Parabola {
-    double a0, a1, a2;
-};
-
 struct PeakCriteria {
     bool valleys;
     double threshold;  // peaks lie above, valleys below
@@ -51,9 +47,6 @@ struct PeakScan {
     double* window;         // width: a window that lies in two blocks
     double* history;        // width: the last samples of the signal so far
 };
-
-// Weights of windows of `width` samples, 3 width elements. Fails as the pseudo-inverse does.
-int32_t DesignPeakWeights(int32_t width, double* weights);
 
 // Adds the peaks of the n samples that come next. A window is looked at when the sample after it is there, or in the
 // last block; so a signal gives the same windows however it is divided. A peak less than 1 sample from the last one
