@@ -44,7 +44,7 @@ KRNUMER_API int32_t NumerIntegration_head(KrHandle y, const double* dt, const in
  * @param[out] integral  the integral; NaN on failure
  * @return               0, or the first that applies of -20008 when `y` has fewer than 3 rows or columns; -20006 when
  *                       `steps` has fewer than 2 elements; -20061 when there is no such rule; -20008 when the rule
- * needs more rows or columns; -20001 without memory
+ *                       needs more rows or columns; -20001 without memory
  */
 KRNUMER_API int32_t NumerIntegration2D_head(KrHandle y, KrHandle steps, int32_t rule, double* integral);
 

@@ -71,7 +71,7 @@ KRNUMER_API int32_t AxBCxCIN(KrHandle a, KrHandle b, KrHandle c, int32_t* err);
  * @param[in]  x    1-D double, n elements
  * @param[out] y    1-D double, m elements; empty on failure
  * @param[out] err  status: 0; -20002 when x does not have n elements; -20003 when a dimension is negative; -20001 out
- * of memory
+ *                  of memory
  * @return          0
  */
 KRNUMER_API int32_t AxVect_head(KrHandle a, KrHandle x, KrHandle y, int32_t* err);
@@ -178,7 +178,7 @@ KRNUMER_API int32_t CxSpecialMatrix_head(const int32_t* kind, const int32_t* siz
  * @param[in]  columns  number of columns
  * @param[out] m        2-D double, rows by columns; empty on failure
  * @return              0; -20003 when a size is below 1; -20001 when so many elements cannot be had from the C run
- * time; the host's own status when it refuses the size
+ *                      time; the host's own status when it refuses the size
  */
 KRNUMER_API int32_t InitialMatrixH(int32_t rows, int32_t columns, KrHandle m);
 

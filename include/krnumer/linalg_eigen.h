@@ -26,8 +26,8 @@
  *                           wanted and on failure
  * @param[out] err           status: 0; -20003 when `a` has no elements; -20040 when it is not square, 0 by n included;
  *                           -20061 when `want_vectors` is neither 0 nor 1; -20068 when an element is not finite or is
- * one of the extreme doubles that stand for a missing value; -20062 when an eigenvalue needs more than 40 sweeps;
- * -20001 out of memory
+ *                           one of the extreme doubles that stand for a missing value; -20062 when an eigenvalue needs
+ *                           more than 40 sweeps; -20001 out of memory
  * @return                   0
  */
 KRNUMER_API int32_t EigenValueVector_head(KrHandle a, const int32_t* want_vectors, KrHandle w, KrHandle v,
@@ -43,9 +43,9 @@ KRNUMER_API int32_t EigenValueVector_head(KrHandle a, const int32_t* want_vector
  * @param[in]     want_vectors  0 eigenvalues only, 1 also eigenvectors
  * @param[out]    w             1-D complex, n eigenvalues; empty on failure
  * @param[out]    err           status: 0; -20003 when `a` has no elements; -20040 when it is not square, 0 by n
- * included; -20061 when `kind` or `want_vectors` is neither 0 nor 1; -20068 when an element is not finite or is one of
- * the extreme doubles that stand for a missing value; -20062 when an eigenvalue needs more than 30 sweeps; -20001 out
- * of memory
+ *                              included; -20061 when `kind` or `want_vectors` is neither 0 nor 1; -20068 when an
+ *                              element is not finite or is one of the extreme doubles that stand for a missing value;
+ *                              -20062 when an eigenvalue needs more than 30 sweeps; -20001 out of memory
  * @return                      0
  */
 KRNUMER_API int32_t CxEigenValueVector_head(KrHandle a, const int32_t* kind, const int32_t* want_vectors, KrHandle w,
@@ -61,9 +61,9 @@ KRNUMER_API int32_t CxEigenValueVector_head(KrHandle a, const int32_t* kind, con
  * @param[in]     want_vectors  0 eigenvalues only, 1 also eigenvectors
  * @param[out]    w             1-D double, n eigenvalues, ascending; empty on failure
  * @param[out]    err           status: 0; -20040 when `a` is not square, 0 by n included; -20003 when it has no
- * elements; -20061 when `want_vectors` is neither 0 nor 1; -20068 when an element, of either triangle, is not finite or
- * is one of the extreme doubles that stand for a missing value; -20062 when an eigenvalue needs more than 30 sweeps;
- * -20001 out of memory
+ *                              elements; -20061 when `want_vectors` is neither 0 nor 1; -20068 when an element, of
+ *                              either triangle, is not finite or is one of the extreme doubles that stand for a missing
+ *                              value; -20062 when an eigenvalue needs more than 30 sweeps; -20001 out of memory
  * @return                      0
  */
 KRNUMER_API int32_t SymEvectorEvalue_head(KrHandle a, const int32_t* want_vectors, KrHandle w, int32_t* err);
@@ -74,8 +74,8 @@ KRNUMER_API int32_t SymEvectorEvalue_head(KrHandle a, const int32_t* want_vector
  * @param[in]  a    2-D double, n by n
  * @param[out] c    1-D double, n + 1 coefficients, the last of them 1; empty on failure
  * @param[out] err  status: 0; -20003 when `a` has no elements; -20040 when it is not square, 0 by n included; -20068
- * when an element is not finite or is one of the extreme doubles that stand for a missing value; -20062 when an
- * eigenvalue needs more than 40 sweeps; -20001 out of memory
+ *                  when an element is not finite or is one of the extreme doubles that stand for a missing value;
+ *                  -20062 when an eigenvalue needs more than 40 sweeps; -20001 out of memory
  * @return          0
  */
 KRNUMER_API int32_t MatrixCharacteristicPoly_head(KrHandle a, KrHandle c, int32_t* err);

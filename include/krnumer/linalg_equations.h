@@ -24,8 +24,9 @@
  * @param[in]     form   0 for any A, 1 for an A that is upper quasi-triangular already, as a Schur form is
  * @param[out]    scale  scale of the right-hand side; 1 on failure
  * @return               0; -20003 when `a` is empty; -20040 when it is not square; -20002 when `q` has another size;
- * -20061 for another `form`; -20068 for data that cannot be used; -20062 without convergence; -20073 or -20074 when
- * LAPACK reports a failed reordering, -20999 when it fails otherwise; -20001 without memory
+ *                       -20061 for another `form`; -20068 for data that cannot be used; -20062 without convergence;
+ *                       -20073 or -20074 when LAPACK reports a failed reordering, -20999 when it fails otherwise;
+ *                       -20001 without memory
  */
 KRNUMER_API int32_t Lyapunov_head(KrHandle a, KrHandle q, int32_t form, double* scale);
 
@@ -67,9 +68,9 @@ KRNUMER_API int32_t CxSylvester_head(KrHandle a, KrHandle b, KrHandle c, int32_t
  * @param[out]    scale     scale of the right-hand side; 1 when the equation is singular, and on failure
  * @param[out]    singular  1 when op(A) and -sign op(B) have a common eigenvalue or nearly so, else 0; 0 on failure
  * @return                  0; -20040 when `a` or `b` is not square; -20002 when `c` does not match them; -20003 when
- * they are empty; -20061 for another value of a selector; -20068 for data that cannot be used; -20062 without
- * convergence; -20073 or -20074 when LAPACK reports a failed reordering, -20999 when it fails otherwise; -20001 without
- * memory
+ *                          they are empty; -20061 for another value of a selector; -20068 for data that cannot be used;
+ *                          -20062 without convergence; -20073 or -20074 when LAPACK reports a failed reordering, -20999
+ *                          when it fails otherwise; -20001 without memory
  */
 KRNUMER_API int32_t Sylvester81_head(KrHandle a, KrHandle b, KrHandle c, int32_t transA, int32_t transB, int32_t sign,
                                      int32_t form, double* scale, int32_t* singular);

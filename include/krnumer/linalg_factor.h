@@ -17,7 +17,7 @@
  * @param[in,out] a     2-D double, n by n; U on and above the diagonal, L without its unit diagonal below; empty on
  *                      failure
  * @param[out]    p     the exchanges, one after the other: row k with row P[k], counted from 0. A 1-D array of n
- * elements of 8 bytes, whose first 4 n bytes hold P as int32; empty on failure
+ *                      elements of 8 bytes, whose first 4 n bytes hold P as int32; empty on failure
  * @param[out]    sign  0 after an even number of exchanges, 1 after an odd one; 0 on failure
  * @param[out]    err   status: 0; +20003 when a column offered no pivot; -20040 when A is not square; -20003 when it is
  *                      empty; -20001 out of memory

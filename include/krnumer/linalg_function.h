@@ -16,7 +16,7 @@
  *
  * @param[in,out] a    matrix; its exponential on return. Data that are not finite give NaN
  * @param[out]    err  status: 0; -20003 when `a` is empty; -20040 when it is not square, before -20003; -20001 without
- * memory
+ *                     memory
  * @return             0
  */
 KRNUMER_API int32_t MatrixExp_head(KrHandle a, int32_t* err);
@@ -31,9 +31,9 @@ KRNUMER_API int32_t CxMatrixExp_head(KrHandle a, int32_t* err);
  * @param[in]  a    matrix
  * @param[out] l    logarithm, 2-D complex
  * @param[out] err  status: 0; the warning 20006 when the corrections did not converge, as a rule with a good result;
- * -20003 when `a` is empty; -20040 when it is not square, before -20003; -20068 for data that cannot be used; -20060
- * for an eigenvalue of 0; -20041 for dependent eigenvectors; -20062 when eigenvalues do not converge; -20001 without
- *                  memory or when `l` cannot be sized
+ *                  -20003 when `a` is empty; -20040 when it is not square, before -20003; -20068 for data that cannot
+ *                  be used; -20060 for an eigenvalue of 0; -20041 for dependent eigenvectors; -20062 when eigenvalues
+ *                  do not converge; -20001 without memory or when `l` cannot be sized
  * @return          0
  */
 KRNUMER_API int32_t MatrixLn_head(KrHandle a, KrHandle l, int32_t* err);
@@ -66,8 +66,8 @@ KRNUMER_API int32_t CxMatrixSqrt_head(KrHandle a, int32_t* err);
  * @param[in]  a  matrix
  * @param[out] s  root, 2-D complex
  * @return        0; the warning 20006 when the second smallest eigenvalue is near 0, so that there may be no root;
- * -20003 when `a` is empty; -20040 when it is not square; -20068 for data that cannot be used; -20062 without
- * convergence; -20999 when LAPACK fails; -20001 without memory or when `s` cannot be sized
+ *                -20003 when `a` is empty; -20040 when it is not square; -20068 for data that cannot be used; -20062
+ *                without convergence; -20999 when LAPACK fails; -20001 without memory or when `s` cannot be sized
  */
 KRNUMER_API int32_t MatrixSqrtH(KrHandle a, KrHandle s);
 
@@ -77,7 +77,7 @@ KRNUMER_API int32_t MatrixSqrtH(KrHandle a, KrHandle s);
  * @param[in,out] a      matrix; its power on return
  * @param[in]     power  exponent
  * @return               0; -20003 when `a` is empty; -20040 when it is not square; for negative powers -20068 for data
- * that cannot be used and -20062 when singular values do not converge; -20001 without memory
+ *                       that cannot be used and -20062 when singular values do not converge; -20001 without memory
  */
 KRNUMER_API int32_t MatrixPower_head(KrHandle a, int32_t power);
 

@@ -14,7 +14,7 @@
  *
  * @param[in,out] a    2-D double, n by n; becomes the inverse; empty on failure
  * @param[out]    err  status: 0; -20040 when A is not square; -20003 when it is empty; -20041 when it is singular;
- * -20001 out of memory
+ *                     -20001 out of memory
  * @return             0
  */
 KRNUMER_API int32_t InvMatrixLUDri_head(KrHandle a, int32_t* err);
@@ -43,7 +43,7 @@ KRNUMER_API int32_t CxInvMatrixChoDri_head(KrHandle a, int32_t* err);
  * @param[in,out] a         2-D double, n by n; becomes the inverse, with zeros in the other triangle; empty on failure
  * @param[in]     triangle  0 the lower triangle, 1 the upper one
  * @param[out]    err       status: 0; -20040 when A is not square; -20003 when it is empty; -20061 for another
- * triangle; -20041 when the triangle is singular; -20001 out of memory
+ *                          triangle; -20041 when the triangle is singular; -20001 out of memory
  * @return                  0
  */
 KRNUMER_API int32_t InvMatrixTriDri_head(KrHandle a, const int32_t* triangle, int32_t* err);
@@ -61,7 +61,7 @@ KRNUMER_API int32_t CxInvMatrixTriDri_head(KrHandle a, const int32_t* triangle, 
  * @param[in,out] lu   2-D double, n by n: the factors; becomes the inverse; empty on failure
  * @param[in]     p    1-D array of n elements, the exchanges as int32 in its first 4 n bytes
  * @param[out]    err  status: 0; -20002 when p does not have n elements; -20040 when LU is not square; -20003 when it
- * is empty; -20017 when an exchange is with no row of the matrix; -20001 out of memory
+ *                     is empty; -20017 when an exchange is with no row of the matrix; -20001 out of memory
  * @return             0
  */
 KRNUMER_API int32_t LUInvMatrix_head(KrHandle lu, KrHandle p, int32_t* err);
@@ -74,7 +74,7 @@ KRNUMER_API int32_t CxLUInvMatrix_head(KrHandle lu, KrHandle p, int32_t* err);
  *
  * @param[in,out] l    1-D double, n(n+1)/2 elements; becomes the lower triangle of the inverse; empty on failure
  * @param[out]    err  status: 0; -20003 when L is empty; -20040 when its length is not n(n+1)/2 for any n; -20001 out
- * of memory
+ *                     of memory
  * @return             0
  */
 KRNUMER_API int32_t Cholesky_InvMatrix_head(KrHandle l, int32_t* err);
@@ -87,7 +87,7 @@ KRNUMER_API int32_t CxCholesky_InvMatrix_head(KrHandle l, int32_t* err);
  * InvMatrixTriDri_head.
  *
  * @param[in,out] t    the elements of the matrix, which become the inverse (empty on failure), and which triangle they
- * are: 0 lower, 1 upper
+ *                     are: 0 lower, 1 upper
  * @param[out]    err  status: 0; -20003 when there are no elements; -20040 when their number is not n(n+1)/2 for any n;
  *                     -20061 for another triangle; -20041 when the matrix is singular
  * @return             0
@@ -102,7 +102,7 @@ KRNUMER_API int32_t CxTri_InvMatrix_head(KrTriangle* t, int32_t* err);
  *
  * @param[in,out] a    2-D double, m by n; becomes the pseudoinverse, n by m; empty on failure
  * @param[in]     tol  absolute tolerance: singular values up to it count as 0. When it is negative or NaN, max(m, n)
- * eps times the largest singular value
+ *                     eps times the largest singular value
  * @param[out]    err  status: 0; -20003 when A is empty; -20068 when it holds NaN, an infinity or the largest double;
  *                     -20062 when the decomposition does not converge; -20001 out of memory
  * @return             0

@@ -16,7 +16,8 @@
  * @param[in]  type  0 general, 1 positive definite, 2 lower triangular, 3 upper triangular
  * @param[out] det   the determinant, 0 for a singular general matrix; NaN on failure
  * @param[out] err   status: 0; -20003 when `a` has no elements; -20040 when it is not square, 0 by n included; -20061
- * when `type` is none of the above; -20071 when a matrix of type 1 is not positive definite; -20001 out of memory
+ *                   when `type` is none of the above; -20071 when a matrix of type 1 is not positive definite; -20001
+ *                   out of memory
  * @return           0
  */
 KRNUMER_API int32_t Determinant_head(KrHandle a, const int32_t* type, double* det, int32_t* err);
@@ -48,11 +49,11 @@ KRNUMER_API int32_t CxRank_head(KrHandle a, const double* tol, int32_t* rank, in
  *
  * @param[in]  a          2-D double, m by n
  * @param[in]  norm_type  0 two-norm (largest singular value), 1 one-norm (largest column sum of magnitudes), 2
- * Frobenius (root of the sum of squares), 3 infinity norm (largest row sum of magnitudes)
+ *                        Frobenius (root of the sum of squares), 3 infinity norm (largest row sum of magnitudes)
  * @param[out] norm       the norm, in the unit of the elements; NaN on failure
  * @param[out] err        status: 0; -20003 when `a` has no elements; -20068 when an element is not finite or is one of
  *                        the extreme doubles that stand for a missing value; -20061 when `norm_type` is none of the
- * above; -20062 when a singular value does not converge; -20001 out of memory
+ *                        above; -20062 when a singular value does not converge; -20001 out of memory
  * @return                0
  */
 KRNUMER_API int32_t Norm_head(KrHandle a, const int32_t* norm_type, double* norm, int32_t* err);
@@ -70,8 +71,8 @@ KRNUMER_API int32_t CxNorm_head(KrHandle a, const int32_t* norm_type, double* no
  *                        singular value is not above max(m, n) times the largest times 2.2e-16; NaN on failure
  * @param[out] err        status: 0; -20003 when `a` has no elements; -20068 when an element is not finite or is one of
  *                        the extreme doubles that stand for a missing value; -20061 when `norm_type` is none of the
- * above; -20040 when `a` is not square and `norm_type` is not 0; -20062 when a singular value does not converge; -20001
- * out of memory
+ *                        above; -20040 when `a` is not square and `norm_type` is not 0; -20062 when a singular value
+ *                        does not converge; -20001 out of memory
  * @return                0
  */
 KRNUMER_API int32_t CondNumber_head(KrHandle a, const int32_t* norm_type, double* cond, int32_t* err);
@@ -86,8 +87,8 @@ KRNUMER_API int32_t CxCondNumber_head(KrHandle a, const int32_t* norm_type, doub
  * @param[in]  a     2-D double, n by n
  * @param[out] flag  1 when it is, 0 when it is not and on failure
  * @param[out] err   status: 0; -20003 when `a` has no elements; -20040 when it is not square, 0 by n included; -20068
- * when it is symmetric and an element is not finite or is one of the extreme doubles that stand for a missing value;
- * -20062 when an eigenvalue does not converge; -20001 out of memory
+ *                   when it is symmetric and an element is not finite or is one of the extreme doubles that stand for a
+ *                   missing value; -20062 when an eigenvalue does not converge; -20001 out of memory
  * @return           0
  */
 KRNUMER_API int32_t CheckPosdef_head(KrHandle a, int32_t* flag, int32_t* err);

@@ -20,7 +20,7 @@
  * @param[in]     ihi  last row of it, from ilo on
  * @param[out]    q    orthogonal or unitary factor
  * @return             0; -20040 when `a` is not square; -20003 when it is empty; -20017 unless 0 <= ilo <= ihi < n;
- * -20068 for data that cannot be used; -20001 without memory or when `q` cannot be sized
+ *                     -20068 for data that cannot be used; -20001 without memory or when `q` cannot be sized
  */
 KRNUMER_API int32_t Hessenberg_head(KrHandle a, int32_t ilo, int32_t ihi, KrHandle q);
 
@@ -36,7 +36,7 @@ KRNUMER_API int32_t CxHessenberg_head(KrHandle a, int32_t ilo, int32_t ihi, KrHa
  * @param[out]    ihi    last row of it; not touched by a failure
  * @param[out]    scale  factors, and outside ilo to ihi the rows exchanged, counted from 1, 1-D double
  * @return               0; -20003 when `a` is empty; -20040 when it is not square; -20061 for another `job`; -20999
- * when LAPACK refuses the data; -20001 without memory or when `scale` cannot be sized
+ *                       when LAPACK refuses the data; -20001 without memory or when `scale` cannot be sized
  */
 KRNUMER_API int32_t MatrixBalance_head(KrHandle a, int32_t job, int32_t* ilo, int32_t* ihi, KrHandle scale);
 
@@ -53,7 +53,8 @@ KRNUMER_API int32_t CxMatrixBalance_head(KrHandle a, int32_t job, int32_t* ilo, 
  * @param[in]     ihi    from MatrixBalance_head, likewise
  * @param[in]     scale  from MatrixBalance_head
  * @return               0; -20040 when `v` is not square; -20003 when it is empty; -20002 when `scale` has another
- * length; -20061 for another `job`; -20017 when `scale` names a row that does not exist; -20001 without memory
+ *                       length; -20061 for another `job`; -20017 when `scale` names a row that does not exist; -20001
+ *                       without memory
  */
 KRNUMER_API int32_t EigenVBack_head(KrHandle v, int32_t job, int32_t side, int32_t ilo, int32_t ihi, KrHandle scale);
 
@@ -68,8 +69,8 @@ KRNUMER_API int32_t CxEigenVBack_head(KrHandle v, int32_t job, int32_t side, int
  * @param[out]    z            orthogonal or unitary factor; empty when it is not wanted
  * @param[out]    w            eigenvalues, 1-D complex
  * @return                     0; -20003 when `a` is empty; -20040 when it is not square; -20061 for another order;
- * -20068 for data that cannot be used; -20062 without convergence; -20999 when LAPACK fails; -20001 without memory or
- *                             when an output cannot be sized
+ *                             -20068 for data that cannot be used; -20062 without convergence; -20999 when LAPACK
+ *                             fails; -20001 without memory or when an output cannot be sized
  */
 KRNUMER_API int32_t Schur_head(KrHandle a, int32_t wantVectors, KrHandle z, KrHandle w);
 
@@ -87,8 +88,8 @@ KRNUMER_API int32_t CxSchur_head(KrHandle a, int32_t wantVectors, KrHandle z, Kr
  * @param[out]    z            orthogonal or unitary factor; empty when it is not wanted
  * @param[out]    w            eigenvalues, 1-D complex
  * @return                     0; -20003 when `a` is empty; -20040 when it is not square; -20061 for another order;
- * -20068 for data that cannot be used; -20062 without convergence; -20999 when LAPACK fails; -20001 without memory or
- *                             when an output cannot be sized
+ *                             -20068 for data that cannot be used; -20062 without convergence; -20999 when LAPACK
+ *                             fails; -20001 without memory or when an output cannot be sized
  */
 KRNUMER_API int32_t Schur80_head(KrHandle a, int32_t wantVectors, int32_t order, KrHandle z, KrHandle w);
 
@@ -104,9 +105,9 @@ KRNUMER_API int32_t CxSchur80_head(KrHandle a, int32_t wantVectors, int32_t orde
  * @param[out]    beta   denominators, 1-D of double, or complex
  * @param[out]    v      right eigenvectors as columns, 2-D complex; the largest |re| + |im| of each is 1
  * @return               0; -20040 when a matrix is not square; -20070 when they differ in size; -20003 when they are
- * empty; -20061 for another order; -20068 for data that cannot be used; -20062 without convergence; -20073 when pairs
- *                       cannot be exchanged; -20999 when LAPACK fails; -20001 without memory or when an output cannot
- * be sized
+ *                       empty; -20061 for another order; -20068 for data that cannot be used; -20062 without
+ *                       convergence; -20073 when pairs cannot be exchanged; -20999 when LAPACK fails; -20001 without
+ *                       memory or when an output cannot be sized
  */
 KRNUMER_API int32_t QZ_head(KrHandle a, KrHandle b, KrHandle alpha, KrHandle beta, KrHandle v);
 
@@ -129,9 +130,9 @@ KRNUMER_API int32_t CxQZ_head(KrHandle a, KrHandle b, KrHandle alpha, KrHandle b
  * @param[out]    beta   denominators, 1-D of double, or complex
  * @param[out]    v      right eigenvectors as columns, 2-D complex; the largest |re| + |im| of each is 1
  * @return               0; -20040 when a matrix is not square; -20070 when they differ in size; -20003 when they are
- * empty; -20061 for another order; -20068 for data that cannot be used; -20062 without convergence; -20073 when pairs
- *                       cannot be exchanged; -20999 when LAPACK fails; -20001 without memory or when an output cannot
- * be sized
+ *                       empty; -20061 for another order; -20068 for data that cannot be used; -20062 without
+ *                       convergence; -20073 when pairs cannot be exchanged; -20999 when LAPACK fails; -20001 without
+ *                       memory or when an output cannot be sized
  */
 KRNUMER_API int32_t QZ80_head(KrHandle a, KrHandle b, int32_t mode, int32_t order, KrHandle alpha, KrHandle beta,
                               KrHandle v);
@@ -152,7 +153,7 @@ KRNUMER_API int32_t CxQZ80_head(KrHandle a, KrHandle b, int32_t mode, int32_t or
  * @param[out]    beta   denominators, 1-D of double, or complex
  * @param[in]     which  vectors: 0 none, 1 right, 2 left, 3 both
  * @param[out]    vr     right eigenvectors, or empty; those of a complex pair of a real pencil as real and imaginary
- * part in two columns
+ *                       part in two columns
  * @param[out]    vl     left eigenvectors, or empty, likewise
  * @return               0; the codes of QZ80_head, -20061 for another `which`
  */
@@ -173,10 +174,11 @@ KRNUMER_API int32_t CxTmiQZ_head(KrHandle a, KrHandle b, KrHandle q, KrHandle z,
  * @param[in]  wantVectors  0 for eigenvalues only, 1 for eigenvectors too
  * @param[out] w            eigenvalues, 1-D complex
  * @param[out] v            right eigenvectors as columns, 2-D complex, the largest |re| + |im| of each 1; empty when
- * not wanted
+ *                          not wanted
  * @return                  0; -20040 when a matrix is not square; -20070 when they differ in size; -20003 when they are
- * empty; -20061 for another `wantVectors`; -20068 for data that cannot be used; -20062 without convergence; -20999 when
- * LAPACK fails; -20001 without memory or when an output cannot be sized
+ *                          empty; -20061 for another `wantVectors`; -20068 for data that cannot be used; -20062 without
+ *                          convergence; -20999 when LAPACK fails; -20001 without memory or when an output cannot be
+ *                          sized
  */
 KRNUMER_API int32_t GenEigenEx_head(KrHandle a, KrHandle b, int32_t wantVectors, KrHandle w, KrHandle v);
 

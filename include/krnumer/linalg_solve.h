@@ -19,7 +19,8 @@
  * @param[in]  b    1-D double, m elements
  * @param[out] x    1-D double, n elements; empty on failure
  * @param[out] err  status: 0; -20002 when b does not have m elements; -20003 when A is empty; -20068 when A or b holds
- * NaN, an infinity or the largest double; -20062 when the decomposition does not converge; -20001 out of memory
+ *                  NaN, an infinity or the largest double; -20062 when the decomposition does not converge; -20001 out
+ *                  of memory
  * @return          0
  */
 KRNUMER_API int32_t GenLinEqs_head(KrHandle a, KrHandle b, KrHandle x, int32_t* err);
@@ -49,7 +50,7 @@ KRNUMER_API int32_t CxGenLinEqs82_head(KrHandle a, KrHandle b, KrHandle x, doubl
  * @param[in]  b  2-D double, m by k
  * @param[out] x  2-D double, n by k; empty on failure
  * @return        0; +20001, with X valid, when singular values counted as 0; -20003 when A is empty or B has no
- * columns; -20002 when B does not have m rows; -20068, -20062, -20001 as for GenLinEqs_head
+ *                columns; -20002 when B does not have m rows; -20068, -20062, -20001 as for GenLinEqs_head
  */
 KRNUMER_API int32_t EqsSetBySVDDri_head(KrHandle a, KrHandle b, KrHandle x);
 
@@ -82,7 +83,7 @@ KRNUMER_API int32_t CxEqsSetBySVDDri82_head(KrHandle a, KrHandle b, KrHandle x, 
  * @param[in]  b    1-D double, as many elements as A has rows
  * @param[out] x    1-D double, n elements; empty on failure
  * @param[out] err  status: 0; -20002 when b has another length; -20003 when A is empty; -20040 when A has more columns
- * than rows; -20041 when it is singular; -20001 out of memory
+ *                  than rows; -20041 when it is singular; -20001 out of memory
  * @return          0
  */
 KRNUMER_API int32_t EqsByLUDri_head(KrHandle a, KrHandle b, KrHandle x, int32_t* err);
@@ -112,7 +113,8 @@ KRNUMER_API int32_t CxEqsSetByLUDri_head(KrHandle a, KrHandle b, KrHandle x);
  * @param[in]     p    1-D array of n elements, the exchanges as int32 in its first 4 n bytes
  * @param[in,out] b    1-D double, n elements; becomes x; empty on failure
  * @param[out]    err  status: 0; -20002 when p or b does not have n elements; -20040 when LU is not square; -20003 when
- * it is empty; -20017 when an exchange is with no row of the matrix; -20041 when the diagonal of U holds a zero
+ *                     it is empty; -20017 when an exchange is with no row of the matrix; -20041 when the diagonal of U
+ *                     holds a zero
  * @return             0
  */
 KRNUMER_API int32_t LULinEqs_head(KrHandle lu, KrHandle p, KrHandle b, int32_t* err);
@@ -130,8 +132,8 @@ KRNUMER_API int32_t CxLULinEqs_head(KrHandle lu, KrHandle p, KrHandle b, int32_t
  * @param[in]  b    1-D double, n elements
  * @param[out] x    1-D double, n elements; empty on failure
  * @param[out] err  status: 0; -20040 when A is not square; -20002 when b does not have n elements; -20003 when A is
- * empty; -20068 when A or b holds NaN, an infinity or the largest double; -20071 when A is not positive definite, as
- * for Cholesky_head; -20001 out of memory
+ *                  empty; -20068 when A or b holds NaN, an infinity or the largest double; -20071 when A is not
+ *                  positive definite, as for Cholesky_head; -20001 out of memory
  * @return          0
  */
 KRNUMER_API int32_t EqsByCholeskyDri_head(KrHandle a, KrHandle b, KrHandle x, int32_t* err);
@@ -150,7 +152,8 @@ KRNUMER_API int32_t CxEqsByCholeskyDri_head(KrHandle a, KrHandle b, KrHandle x, 
  * @param[in]  b         2-D double, n by k
  * @param[out] x         2-D double, n by k; empty on failure
  * @return               0; -20003 when A is empty or B has no columns; -20040 when A is not square; -20002 when B does
- * not have n rows; -20061 for another triangle; -20068, -20071, -20001 as for EqsByCholeskyDri_head
+ *                       not have n rows; -20061 for another triangle; -20068, -20071, -20001 as for
+ *                       EqsByCholeskyDri_head
  */
 KRNUMER_API int32_t EqsSetByCholeskyDri_head(KrHandle a, int32_t triangle, KrHandle b, KrHandle x);
 
@@ -164,7 +167,7 @@ KRNUMER_API int32_t CxEqsSetByCholeskyDri_head(KrHandle a, int32_t triangle, KrH
  * @param[in]     l    1-D double, n(n+1)/2 elements
  * @param[in,out] b    1-D double, n elements; becomes x; empty on failure
  * @param[out]    err  status: 0; -20002 when b does not have n elements, n being the order of the largest triangle in
- * L; -20040 when the length of L is not n(n+1)/2 for any n; -20003 when L is empty
+ *                     L; -20040 when the length of L is not n(n+1)/2 for any n; -20003 when L is empty
  * @return             0
  */
 KRNUMER_API int32_t CholeskyLinEqs_head(KrHandle l, KrHandle b, int32_t* err);
@@ -181,8 +184,8 @@ KRNUMER_API int32_t CxCholeskyLinEqs_head(KrHandle l, KrHandle b, int32_t* err);
  * @param[in]     t    the elements of T and which triangle they are: 0 lower, any other value upper
  * @param[in,out] b    1-D double, n elements; becomes x; empty on failure
  * @param[out]    err  status: 0; -20002 when b does not have n elements, n being the order of the largest triangle in
- * T; -20040 when the length of T is not n(n+1)/2 for any n; -20003 when T is empty; -20068 when T or b holds NaN, an
- * infinity or the largest double; -20041 when T is singular
+ *                     T; -20040 when the length of T is not n(n+1)/2 for any n; -20003 when T is empty; -20068 when T
+ *                     or b holds NaN, an infinity or the largest double; -20041 when T is singular
  * @return             0
  */
 KRNUMER_API int32_t TriLinEqs_head(const KrTriangle* t, KrHandle b, int32_t* err);
@@ -202,7 +205,8 @@ KRNUMER_API int32_t CxTriLinEqs_head(const KrTriangle* t, KrHandle b, int32_t* e
  * @param[in]  b         2-D double, n by k
  * @param[out] x         2-D double, n by k; empty on failure
  * @return               0; -20003 when A is empty or B has no columns; -20040 when A is not square; -20002 when B does
- * not have n rows; -20061 for another triangle; -20068, -20041 as for TriLinEqs_head; -20001 out of memory
+ *                       not have n rows; -20061 for another triangle; -20068, -20041 as for TriLinEqs_head; -20001 out
+ *                       of memory
  */
 KRNUMER_API int32_t TriEqsSetDri_head(KrHandle a, int32_t triangle, KrHandle b, KrHandle x);
 
@@ -220,8 +224,8 @@ KRNUMER_API int32_t CxTriEqsSetDri_head(KrHandle a, int32_t triangle, KrHandle b
  * @param[in]     kl  diagonals below the main one
  * @param[in]     ku  diagonals above the main one
  * @return            0; -20008 when AB does not have kl + ku + 1 rows, or kl or ku is negative, or kl + ku + 1 is above
- * n; -20070 when b does not have n elements; -20003 when AB has no columns; -20041 when A is singular; -20001 out of
- * memory
+ *                    n; -20070 when b does not have n elements; -20003 when AB has no columns; -20041 when A is
+ *                    singular; -20001 out of memory
  */
 KRNUMER_API int32_t BandEqsDriH(KrHandle ab, KrHandle b, int32_t kl, int32_t ku);
 

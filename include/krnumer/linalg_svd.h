@@ -57,7 +57,7 @@ KRNUMER_API int32_t CxSVDEx_head(KrHandle a, int32_t full, KrHandle u, KrHandle 
  * @param[out] s    1-D double, k singular values; empty on failure
  * @param[out] err  status: 0; -20003 when `a` has no elements; -20068 when an element is not finite or is one of the
  *                  extreme doubles that stand for a missing value; -20062 when a singular value does not converge
- * within 99 sweeps; -20001 out of memory
+ *                  within 99 sweeps; -20001 out of memory
  * @return          0
  */
 KRNUMER_API int32_t SVDS_head(KrHandle a, KrHandle s, int32_t* err);

@@ -27,7 +27,7 @@
  * @param[out]    intercept  intercept
  * @param[out]    mse        mean square error
  * @return                   0; -20002 when the arrays differ in length; -20006 for fewer than two points; -20001
- * without memory
+ *                           without memory
  */
 KRNUMER_API int32_t LinFit_head(KrHandle y, KrHandle x, KrHandle w, double* slope, double* intercept, double* mse);
 
@@ -68,10 +68,10 @@ KRNUMER_API int32_t LinFitCoef80_head(KrHandle y, KrHandle x, KrHandle w, double
  * @param[out] coef     coefficients, the constant first
  * @param[out] mse      mean square error
  * @return              0; -20002 when the arrays differ in length; -20103 when `order` is negative; -20037 when it is
- * not below the number of points; -20061 for another `method`; -20041 when the system is singular (methods 1 to 5);
- *                      -20071 when the normal equations are not positive definite (5); -20062 when the singular values
- * do not converge (0, 6); -20068 for data that are not finite (0, 5, 6); -20001 without memory or when an output cannot
- * be sized
+ *                      not below the number of points; -20061 for another `method`; -20041 when the system is singular
+ *                      (methods 1 to 5); -20071 when the normal equations are not positive definite (5); -20062 when
+ *                      the singular values do not converge (0, 6); -20068 for data that are not finite (0, 5, 6);
+ *                      -20001 without memory or when an output cannot be sized
  */
 KRNUMER_API int32_t PolyFit_head(KrHandle x, KrHandle y, int32_t order, int32_t method, KrHandle bestFit, KrHandle coef,
                                  double* mse);
@@ -84,14 +84,14 @@ KRNUMER_API int32_t PolyFit_head(KrHandle x, KrHandle y, int32_t order, int32_t 
  * @param[in]  order        order, from 0 on
  * @param[in]  method       0 to 6, not looked at where all coefficients are fixed
  * @param[in]  fixedPowers  powers whose coefficients are fixed, 1-D int32; of a power listed twice the last value
- * counts, one out of range is skipped
+ *                          counts, one out of range is skipped
  * @param[in]  fixedValues  the coefficients of these powers
  * @param[out] bestFit      fitted values
  * @param[out] coef         coefficients, the constant first
  * @param[out] mse          mean square error
  * @return                  0; -20002 when x and y, or the two lists, differ in length; -20103 when `order` is negative;
- * -20037 unless there are more points than `order` less the length of the lists, or than free coefficients; -20003
- * without points; and the codes of PolyFit_head
+ *                          -20037 unless there are more points than `order` less the length of the lists, or than free
+ *                          coefficients; -20003 without points; and the codes of PolyFit_head
  */
 KRNUMER_API int32_t PolyFit80_head(KrHandle x, KrHandle y, int32_t order, int32_t method, KrHandle fixedPowers,
                                    KrHandle fixedValues, KrHandle bestFit, KrHandle coef, double* mse);
@@ -121,17 +121,17 @@ KRNUMER_API int32_t PolyFit81_head(KrHandle x, KrHandle y, int32_t order, KrHand
  * @param[in]  h               observations, 2-D, a row for each ordinate and a column for each of the k functions
  * @param[in]  y               ordinates
  * @param[in]  sigma           standard deviations, or empty; at least as many as rows, of which the first count; 0
- * stands for a weight of 1
+ *                             stands for a weight of 1
  * @param[in]  method          0 to 6, see above
  * @param[in]  wantCovariance  not 0 for the covariance matrix
  * @param[out] coef            coefficients
  * @param[out] bestFit         fitted values
  * @param[out] covariance      (H' W H)^-1 as a pseudo-inverse, 2-D of k by k; 0 by 0 when it is not wanted. Scaling by
- * the variance of the residuals is the caller's
+ *                             the variance of the residuals is the caller's
  * @param[out] mse             mean square error
  * @return                     0; -20002 when `y` or `sigma` does not match the rows; -20001 without memory or when an
- * output cannot be sized; -20021 without columns; -20037 for fewer rows than columns; -20061 for another `method`; and
- * the codes of the solvers under PolyFit_head
+ *                             output cannot be sized; -20021 without columns; -20037 for fewer rows than columns;
+ *                             -20061 for another `method`; and the codes of the solvers under PolyFit_head
  */
 KRNUMER_API int32_t GenLSFit_head(KrHandle h, KrHandle y, KrHandle sigma, int32_t method, int32_t wantCovariance,
                                   KrHandle coef, KrHandle bestFit, KrHandle covariance, double* mse);
@@ -149,8 +149,8 @@ KRNUMER_API int32_t GenLSFit80_head(KrHandle h, KrHandle y, KrHandle w, int32_t 
  * @param[in]     gradient  1-D, k of them
  * @param[in]     lambda    damping
  * @param[out]    err       status: 0, also for a rank-deficient hessian; -20003 when the sizes do not match; -20068 for
- * data that are not finite; -20041 when a new coefficient is NaN; -20062 when the singular values do not converge;
- * -20001 without memory
+ *                          data that are not finite; -20041 when a new coefficient is NaN; -20062 when the singular
+ *                          values do not converge; -20001 without memory
  * @return                  0
  */
 KRNUMER_API int32_t GetNewCoef_head(KrHandle coef, KrHandle hessian, KrHandle gradient, const double* lambda,

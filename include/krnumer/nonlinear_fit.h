@@ -32,8 +32,8 @@
  * @param[out]    b      rate, 1 / unit of x
  * @param[out]    mse    mean square error
  * @return               0; -20002 when the arrays differ in length; -20006 for fewer than two points; -20037 for fewer
- * than two points of the sign; -20068 for data that are not finite; -20062 when the singular values do not converge;
- * -20001 without memory
+ *                       than two points of the sign; -20068 for data that are not finite; -20062 when the singular
+ *                       values do not converge; -20001 without memory
  */
 KRNUMER_API int32_t ExpFit_head(KrHandle y, KrHandle x, KrHandle sigma, double* a, double* b, double* mse);
 
@@ -47,15 +47,15 @@ KRNUMER_API int32_t ExpFit_head(KrHandle y, KrHandle x, KrHandle sigma, double* 
  * @param[in]     w       weights, or empty
  * @param[in]     tol     see above
  * @param[in]     init    a and b to start from, see above
- * @param[in]     method  0 for the straight line through the logarithms alone, which leaves `iter`; 1 to iterate.
- * Its low 16 bits count
+ * @param[in]     method  0 for the straight line through the logarithms alone, which leaves `iter`; 1 to iterate. Its
+ *                        low 16 bits count
  * @param[out]    a       amplitude
  * @param[out]    b       rate, 1 / unit of x
  * @param[out]    mse     mean square error
  * @param[in,out] iter    see above
  * @param[in]     msetol  see above
  * @return                0; 20010 when `init` has another length; -20061 for another `method`; and the codes of
- * ExpFit_head
+ *                        ExpFit_head
  */
 KRNUMER_API int32_t ExpFit80_head(KrHandle y, KrHandle x, KrHandle w, double tol, KrHandle init, int32_t method,
                                   double* a, double* b, double* mse, int32_t* iter, double msetol);
@@ -103,7 +103,7 @@ KRNUMER_API int32_t ExpFitCoef80_head(KrHandle y, KrHandle x, KrHandle w, int32_
  * @param[in,out] iter    see above
  * @param[in]     msetol  see above
  * @return                0; 20010 when `init` has another length; -20140 for an x that is not above 0; and the codes of
- * ExpFit_head
+ *                        ExpFit_head
  */
 KRNUMER_API int32_t PowerFit_head(KrHandle y, KrHandle x, KrHandle w, double tol, KrHandle init, double* a, double* b,
                                   double* mse, int32_t* iter, double msetol);
@@ -138,7 +138,7 @@ KRNUMER_API int32_t PowerFitCoef_head(KrHandle y, KrHandle x, KrHandle w, double
  * @param[out]    b     scale, 1 / unit of x
  * @param[out]    mse   mean square error
  * @return              0; -20002 when the arrays differ in length; -20140 for a `base` that is not above 0; -20006 for
- * fewer than two points; -20036 where x does not have one sign; -20001 without memory
+ *                      fewer than two points; -20036 where x does not have one sign; -20001 without memory
  */
 KRNUMER_API int32_t LogFit_head(KrHandle y, KrHandle x, KrHandle w, double base, double* a, double* b, double* mse);
 
@@ -175,8 +175,8 @@ KRNUMER_API int32_t LogFitCoef_head(KrHandle y, KrHandle x, KrHandle w, double b
  * @param[in,out] iter    see above
  * @param[in]     msetol  see above
  * @return                0; 20010 when `init` has another length; -20002 when the arrays differ in length; -20007 for
- * fewer than three points; -20068 for abscissas that are not finite; -20026 for a sigma of 0 at the start; -20001
- * without memory
+ *                        fewer than three points; -20068 for abscissas that are not finite; -20026 for a sigma of 0 at
+ *                        the start; -20001 without memory
  */
 KRNUMER_API int32_t GaussianPeakFit_head(KrHandle y, KrHandle x, KrHandle w, double tol, KrHandle init, double* a,
                                          double* mu, double* sigma, double* mse, int32_t* iter, double msetol);

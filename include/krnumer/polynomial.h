@@ -37,13 +37,13 @@ KRNUMER_API int32_t EvPoly2D(KrHandle x, KrHandle coef, int32_t* err);
  * @param[in]  newtonLimit    most steps for each
  * @param[in]  newtonTol      least relative step
  * @param[in]  pairGuesses    guesses of pairs, 1-D complex double, two in a row, or empty; an odd last one is its own
- * partner and counts once
+ *                            partner and counts once
  * @param[in]  pairLimit      most steps for each pair
  * @param[in]  pairTol        least relative change of the factor
  * @param[out] roots          1-D complex double, one for each guess: Newton's roots, the real roots of pairs, the
- * complex ones; emptied by anything but 0
+ *                            complex ones; emptied by anything but 0
  * @return                    0; the warning 20002 when `coef` is empty; -20001 without memory or when `roots` cannot be
- * sized
+ *                            sized
  */
 KRNUMER_API int32_t PolyRootsNtBst_head(KrHandle coef, KrHandle newtonGuesses, int32_t newtonLimit, double newtonTol,
                                         KrHandle pairGuesses, int32_t pairLimit, double pairTol, KrHandle roots);
@@ -53,11 +53,11 @@ KRNUMER_API int32_t PolyRootsNtBst_head(KrHandle coef, KrHandle newtonGuesses, i
  * method with a search along the step, each divided out before the next.
  *
  * @param[in,out] coef   coefficients, 1-D complex double; on return one element less: the roots in the order in which
- * they were found, those at 0 first. Zeros in the place of the highest coefficients give fewer roots, and zeros behind
- * them. Emptied on failure
+ *                       they were found, those at 0 first. Zeros in the place of the highest coefficients give fewer
+ *                       roots, and zeros behind them. Emptied on failure
  * @param[in]     limit  how often the step towards a root may be turned in a row before the search is given up
  * @param[out]    err    status: 0; -20003 when `coef` is empty; -20063 for a coefficient that is not finite, and when
- * nothing but a constant is left; -20062 without convergence; -20001 without memory
+ *                       nothing but a constant is left; -20062 without convergence; -20001 without memory
  * @return               0
  */
 KRNUMER_API int32_t CxPolyRoots_head(KrHandle coef, const int32_t* limit, int32_t* err);
@@ -72,18 +72,19 @@ KRNUMER_API int32_t CxPolyRoots_head(KrHandle coef, const int32_t* limit, int32_
  * only those that are equal to the last bit count as one root.
  *
  * @param[in,out] coef           coefficients, 1-D double; zeros in the place of the highest ones are left out. Kept on
- * success, emptied on failure
+ *                               success, emptied on failure
  * @param[in]     distinct       0 to leave out the second stage
  * @param[in]     tol            residual below which a divisor is accepted, and 1/100 of the limit of its singular
- * value; not positive for 1e-10
+ *                               value; not positive for 1e-10
  * @param[out]    roots          1-D complex double: the distinct roots of the first stage, the root 0 last
  * @param[out]    distinctRoots  1-D complex double: the roots of the second stage by descending modulus, the root 0
- * last; empty without it
+ *                               last; empty without it
  * @param[out]    mult           1-D int32: multiplicities of `distinctRoots`, or without the second stage of `roots`
  * @return                       0; -20003 when `coef` is empty; -20063 for a coefficient that is not finite, as it
- * comes or over the highest one; -20111 when all are 0; -20021 for a constant; -20062 when eigenvalues or singular
- * values do not converge; -20068 when extreme coefficients overflow on the way; -20001 without memory or when an output
- * cannot be sized. All arrays are emptied by a failure
+ *                               comes or over the highest one; -20111 when all are 0; -20021 for a constant; -20062
+ *                               when eigenvalues or singular values do not converge; -20068 when extreme coefficients
+ *                               overflow on the way; -20001 without memory or when an output cannot be sized. All
+ *                               arrays are emptied by a failure
  */
 KRNUMER_API int32_t MultPolyRoots_head(KrHandle coef, int32_t distinct, double tol, KrHandle roots,
                                        KrHandle distinctRoots, KrHandle mult);
@@ -102,14 +103,14 @@ KRNUMER_API int32_t CxMultPolyRoots_head(KrHandle coef, int32_t distinct, double
  * @param[in]  p              coefficients, 1-D double
  * @param[in]  q              coefficients, 1-D double
  * @param[in]  tol            a divisor is seen where the least singular value of a matrix of c columns is below sqrt(c)
- * tol; not positive for 1e-8
+ *                            tol; not positive for 1e-8
  * @param[out] gcd            the divisor, 1 for polynomials without a common root
  * @param[out] pCofactor      p over the divisor; touched only where `wantCofactors` is 1, or by a failure
  * @param[out] qCofactor      q over the divisor, likewise
  * @param[in]  wantCofactors  1 for the cofactors
  * @return                    0; -20003 when `p` or `q` is empty; -20063 for a coefficient that is not finite; -20111
- * when one polynomial is 0; -20062 when the singular values do not converge; -20001 without memory or when an output
- * cannot be sized. All outputs are emptied by a failure
+ *                            when one polynomial is 0; -20062 when the singular values do not converge; -20001 without
+ *                            memory or when an output cannot be sized. All outputs are emptied by a failure
  */
 KRNUMER_API int32_t PolyGCD_H(KrHandle p, KrHandle q, double tol, KrHandle gcd, KrHandle pCofactor, KrHandle qCofactor,
                               int32_t wantCofactors);
