@@ -24,10 +24,10 @@ int32_t ConvolveSpectra(const T* x, int32_t nx, const T* y, int32_t ny, T* z) {
     T* c = b + n;
     CopyPadded(x, nx, a, n);
     CopyPadded(y, ny, b, n);
-    if (const int32_t status = Forward(table, a, c, n)) return status;
-    if (const int32_t status = Forward(table, b, a, n)) return status;
+    if (const int32_t status = Forward(table.get(), a, c, n)) return status;
+    if (const int32_t status = Forward(table.get(), b, a, n)) return status;
     MultiplySpectra(c, a, b, n);
-    if (const int32_t status = Inverse(table, b, a, n)) return status;
+    if (const int32_t status = Inverse(table.get(), b, a, n)) return status;
     std::copy_n(a, FullLength(nx, ny), z);
     return kOk;
 }
@@ -68,9 +68,9 @@ int32_t Autocorrelate(const double* x, int32_t nx, double* z) {
     double* a = work.data();
     double* b = a + n;
     CopyPadded(x, nx, a, n);
-    if (const int32_t status = Forward(table, a, b, n)) return status;
+    if (const int32_t status = Forward(table.get(), a, b, n)) return status;
     HalfComplexMultiply(b, b, b, n);
-    if (const int32_t status = Inverse(table, b, a, n)) return status;
+    if (const int32_t status = Inverse(table.get(), b, a, n)) return status;
     std::copy_n(a + (n - nx + 1), nx - 1, z);
     std::copy_n(a, nx, z + nx - 1);
     return kOk;
@@ -143,11 +143,11 @@ int32_t Deconvolve(double* x, int32_t n, const double* y, int32_t m) {
     double* b = a + length;
     double* c = b + length;
     CopyPadded(x, n, a, length);
-    if (const int32_t status = Forward(table, a, c, length)) return status;
+    if (const int32_t status = Forward(table.get(), a, c, length)) return status;
     CopyPadded(y, m, a, length);
-    if (const int32_t status = Forward(table, a, b, length)) return status;
+    if (const int32_t status = Forward(table.get(), a, b, length)) return status;
     HalfComplexDivide(c, b, b, length);
-    if (const int32_t status = Inverse(table, b, a, length)) return status;
+    if (const int32_t status = Inverse(table.get(), b, a, length)) return status;
     std::copy_n(a, n - m + 1, x);
     return kOk;
 }

@@ -53,11 +53,11 @@ class ColumnConvolution {
         T* b = a + rows_;
         T* c = b + rows_;
         Gather(x, rx_, b);
-        if (const int32_t status = Forward(table_, b, a, rows_)) return status;
+        if (const int32_t status = Forward(table_.get(), b, a, rows_)) return status;
         Gather(y, ry_, b);
-        if (const int32_t status = Forward(table_, b, c, rows_)) return status;
+        if (const int32_t status = Forward(table_.get(), b, c, rows_)) return status;
         MultiplySpectra(a, c, b, rows_);
-        if (const int32_t status = Inverse(table_, b, a, rows_)) return status;
+        if (const int32_t status = Inverse(table_.get(), b, a, rows_)) return status;
         for (int32_t r = 0; r < rows_; ++r) x.Set(r, a[r]);
         return kOk;
     }
@@ -100,7 +100,7 @@ template <class T>
 int32_t TransformRows(Plane<T> plane, const HeldTable& table, int32_t n, T* padded, T* spectra) {
     for (int32_t r = 0; r < plane.rows; ++r) {
         CopyPadded(plane.data + ptrdiff_t{r} * plane.columns, plane.columns, padded, n);
-        if (const int32_t status = Forward(table, padded, spectra + ptrdiff_t{r} * n, n)) return status;
+        if (const int32_t status = Forward(table.get(), padded, spectra + ptrdiff_t{r} * n, n)) return status;
     }
     return kOk;
 }
@@ -141,7 +141,7 @@ int32_t ConvolveSpectra(Plane<T> x, Plane<T> y, Crop crop, T* z) {
     if (const int32_t status = ConvolveColumns(convolution, spectra_x.data(), spectra_y.data(), columns)) return status;
     for (int32_t r = 0; r < crop.size.rows; ++r) {
         T* spectrum = spectra_x.data() + ptrdiff_t{crop.row + r} * columns;
-        if (const int32_t status = Inverse(table, spectrum, row.data(), columns)) return status;
+        if (const int32_t status = Inverse(table.get(), spectrum, row.data(), columns)) return status;
         z = std::copy_n(row.data() + crop.column, crop.size.columns, z);
     }
     return kOk;

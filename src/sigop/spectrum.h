@@ -1,5 +1,5 @@
-// What convolution and correlation of real and of complex data have in common: spectra in the form that suits the
-// element, half-complex of real sequences and full of complex ones.
+// What operations on spectra of real and of complex data have in common: the form that suits the element, half-complex
+// for real sequences and full for complex ones.
 #pragma once
 
 #include <algorithm>
@@ -13,19 +13,20 @@
 
 namespace krnumer {
 
-inline int32_t Forward(const HeldTable& table, const double* x, double* spectrum, int32_t n) {
-    return RealFFT(table.get(), x, spectrum, 1, 1, n);
+// Output must not overlap input.
+inline int32_t Forward(const qmfft_table* table, const double* x, double* spectrum, int32_t n) {
+    return RealFFT(table, x, spectrum, 1, 1, n);
 }
-inline int32_t Forward(const HeldTable& table, const Complex* x, Complex* spectrum, int32_t n) {
-    return ComplexFFT(table.get(), &x->re, &x->im, &spectrum->re, &spectrum->im, 2, 2, n);
+inline int32_t Forward(const qmfft_table* table, const Complex* x, Complex* spectrum, int32_t n) {
+    return ComplexFFT(table, &x->re, &x->im, &spectrum->re, &spectrum->im, 2, 2, n);
 }
 
-// The spectrum is scratch afterwards.
-inline int32_t Inverse(const HeldTable& table, double* spectrum, double* x, int32_t n) {
-    return InverseRealFFT(table.get(), spectrum, x, 1, 1, n);
+// The spectrum is scratch afterwards, and must not overlap the output.
+inline int32_t Inverse(const qmfft_table* table, double* spectrum, double* x, int32_t n) {
+    return InverseRealFFT(table, spectrum, x, 1, 1, n);
 }
-inline int32_t Inverse(const HeldTable& table, Complex* spectrum, Complex* x, int32_t n) {
-    return InverseComplexFFT(table.get(), &spectrum->re, &spectrum->im, &x->re, &x->im, 2, 2, n);
+inline int32_t Inverse(const qmfft_table* table, Complex* spectrum, Complex* x, int32_t n) {
+    return InverseComplexFFT(table, &spectrum->re, &spectrum->im, &x->re, &x->im, 2, 2, n);
 }
 
 inline void MultiplySpectra(const double* a, const double* b, double* out, int32_t n) {

@@ -1,8 +1,5 @@
-#include <algorithm>
-
 #include "fft/table_slot.h"
 #include "frame/entry.h"
-#include "frame/scratch.h"
 #include "krnumer/transform.h"
 #include "transform/hartley.h"
 #include "transform/trigonometric.h"
@@ -25,14 +22,14 @@ int32_t TransformLine(KrHandle x, KrHandle y, int32_t size, void** slot, const L
     }
     if (const int32_t status = BindTableSlot(slot, line.table_length(n))) return call.Fail(status);
     return call.Run([&]() -> int32_t {
-        Scratch<double> work(LineWork(n));
-        if (!work) return kOutOfMemory;
-        return line.transform({samples.data(), samples.size(), 1}, transformed.data(), 1, n, work.data(),
-                              SlotTable(slot));
+        LinePlan plan(line, n, SlotTable(slot));
+        if (!plan) return kOutOfMemory;
+        return plan.Run(samples.data(), samples.size(), transformed.data());
     });
 }
 
-// What both directions of a two-dimensional transform share: checks, tables, sizes. core(work) does the rest.
+// What both directions of a two-dimensional transform share: tables, sizes, plans. core(along_rows, along_columns) does
+// the rest.
 template <class Core>
 int32_t TransformMatrix(Call& call, OutMatrix<double>& transformed, int32_t rows, int32_t columns, void** slot_rows,
                         void** slot_columns, const LineTransform& line, Core core) {
@@ -40,9 +37,10 @@ int32_t TransformMatrix(Call& call, OutMatrix<double>& transformed, int32_t rows
     if (const int32_t status = BindTableSlot(slot_columns, line.table_length(columns))) return call.Fail(status);
     if (transformed.Resize(rows, columns)) return call.Fail(kOutOfMemory);
     return call.Run([&]() -> int32_t {
-        Scratch<double> work(LineWork(std::max(rows, columns)));
-        if (!work) return kOutOfMemory;
-        return core(work.data());
+        LinePlan along_rows(line, columns, SlotTable(slot_columns));
+        LinePlan along_columns(line, rows, SlotTable(slot_rows));
+        if (!along_rows || !along_columns) return kOutOfMemory;
+        return core(along_rows, along_columns);
     });
 }
 
@@ -54,25 +52,13 @@ int32_t ForwardMatrix(KrHandle x, KrHandle y, int32_t rows, int32_t columns, voi
     if (samples.rows() < 1 || samples.columns() < 1) return call.Fail(kEmptyInput);
     if (rows <= 0) rows = samples.rows();
     if (columns <= 0) columns = samples.columns();
-    return TransformMatrix(call, transformed, rows, columns, slot_rows, slot_columns, line, [&](double* work) {
-        const double* from = samples.data();
-        Scratch<double> resized;
-        if (rows != samples.rows() || columns != samples.columns()) {
-            if (!resized.Allocate(Count(rows) * Count(columns), resized.kZeroed)) return kOutOfMemory;
-            const int32_t width = std::min(columns, samples.columns());
-            for (int32_t row = 0; row < std::min(rows, samples.rows()); ++row) {
-                std::copy_n(from + Count(row) * Count(samples.columns()), width,
-                            resized.data() + Count(row) * Count(columns));
-            }
-            from = resized.data();
-        }
-        double* const to = transformed.data();
-        if (const int32_t status =
-                TransformRows(line.transform, from, to, rows, columns, work, SlotTable(slot_columns))) {
-            return status;
-        }
-        return TransformColumns(line.transform, to, to, rows, columns, work, SlotTable(slot_rows));
-    });
+    return TransformMatrix(call, transformed, rows, columns, slot_rows, slot_columns, line,
+                           [&](LinePlan& along_rows, LinePlan& along_columns) {
+                               double* const to = transformed.data();
+                               const int32_t status = TransformRows(along_rows, samples.data(), samples.rows(),
+                                                                    samples.columns(), to, rows);
+                               return status != kOk ? status : TransformColumns(along_columns, to, to, columns);
+                           });
 }
 
 enum class First { kRows, kColumns };
@@ -85,22 +71,17 @@ int32_t InverseMatrix(KrHandle x, KrHandle y, void** slot_rows, void** slot_colu
     const int32_t rows = spectrum.rows();
     const int32_t columns = spectrum.columns();
     if (rows < 1 || columns < 1) return call.Fail(kEmptyInput);
-    return TransformMatrix(call, samples, rows, columns, slot_rows, slot_columns, line, [&](double* work) {
-        const double* const from = spectrum.data();
-        double* const to = samples.data();
-        const qmfft_table* const row_table = SlotTable(slot_columns);
-        const qmfft_table* const column_table = SlotTable(slot_rows);
-        if (first == First::kRows) {
-            if (const int32_t status = TransformRows(line.transform, from, to, rows, columns, work, row_table)) {
-                return status;
-            }
-            return TransformColumns(line.transform, to, to, rows, columns, work, column_table);
-        }
-        if (const int32_t status = TransformColumns(line.transform, from, to, rows, columns, work, column_table)) {
-            return status;
-        }
-        return TransformRows(line.transform, to, to, rows, columns, work, row_table);
-    });
+    return TransformMatrix(call, samples, rows, columns, slot_rows, slot_columns, line,
+                           [&](LinePlan& along_rows, LinePlan& along_columns) {
+                               const double* const from = spectrum.data();
+                               double* const to = samples.data();
+                               if (first == First::kRows) {
+                                   const int32_t status = TransformRows(along_rows, from, rows, columns, to, rows);
+                                   return status != kOk ? status : TransformColumns(along_columns, to, to, columns);
+                               }
+                               const int32_t status = TransformColumns(along_columns, from, to, columns);
+                               return status != kOk ? status : TransformRows(along_rows, to, rows, columns, to, rows);
+                           });
 }
 
 int32_t TransformInPlace(KrHandle x, void** slot, int32_t (*core)(double*, int32_t, const qmfft_table*)) {

@@ -7,52 +7,38 @@
 #include "frame/numeric.h"
 #include "frame/scratch.h"
 #include "frame/status.h"
+#include "sigop/spectrum.h"
 
 namespace krnumer {
 
 namespace {
 
-// The short transform of one phase. Complex data use all of the work of 4 length doubles, real data half of it.
+// The short transform of one phase. `work` holds twice its length.
 template <class T>
 class PhaseSpectrum {
   public:
-    PhaseSpectrum(double* work, int32_t length) : work_(work), length_(length) {}
+    PhaseSpectrum(T* work, int32_t length) : samples_(work), spectrum_(work + length), length_(length) {}
 
-    // Transforms samples[t stride], where they exist below `end`.
-    int32_t Transform(const T* samples, std::int64_t end, int32_t stride, const qmfft_table* table) {
-        double* const re = work_;
-        double* const im = re + length_;
-        double* const out_re = im + length_;
-        double* const out_im = out_re + length_;
+    // Transforms x[t stride], where they exist below `end`.
+    int32_t Transform(const T* x, std::int64_t end, int32_t stride, const qmfft_table* table) {
         for (int32_t t = 0; t < length_; ++t) {
             const std::int64_t i = std::int64_t{t} * stride;
-            if constexpr (std::is_same_v<T, Complex>) {
-                const Complex sample = i < end ? samples[i] : Complex{};
-                re[t] = sample.re;
-                im[t] = sample.im;
-            } else {
-                re[t] = i < end ? samples[i] : 0.0;
-            }
+            samples_[t] = i < end ? x[i] : T{};
         }
-        if constexpr (std::is_same_v<T, Complex>) {
-            return ComplexFFT(table, re, im, out_re, out_im, 1, 1, length_);
-        } else {
-            return RealFFT(table, re, out_re, 1, 1, length_);
-        }
+        return Forward(table, samples_, spectrum_, length_);
     }
 
     Complex operator[](int32_t k) const {
-        const double* const out = work_ + 2 * static_cast<std::ptrdiff_t>(length_);
         if constexpr (std::is_same_v<T, Complex>) {
-            return {out[k], out[length_ + k]};
+            return spectrum_[k];
         } else {
-            if (k == 0 || k == length_ - k) return {out[k], 0.0};
-            return k < length_ - k ? Complex{out[k], out[length_ - k]} : Complex{out[length_ - k], -out[k]};
+            return HalfComplexValue(spectrum_, length_, k);
         }
     }
 
   private:
-    double* work_;
+    T* samples_;
+    T* spectrum_;
     int32_t length_;
 };
 
@@ -75,19 +61,21 @@ int32_t ZoomTransform(T* x, int32_t n, int32_t phases, int32_t length, int32_t s
     const std::int64_t present = std::min<std::int64_t>(n, total);
 
     std::fill_n(y, count, Complex{});
-    Scratch<double> work(4 * Count(length));
+    Scratch<T> work(2 * Count(length));
     if (!work) return kOutOfMemory;
     PhaseSpectrum<T> spectrum(work.data(), length);
-    const int32_t shift = start >= 0 ? start % length : static_cast<int32_t>(length - -std::int64_t{start} % length);
+    const int32_t remainder = start % length;
+    const int32_t first = remainder < 0 ? remainder + length : remainder;
     for (int32_t phase = 0; phase < phases && phase < present; ++phase) {
         if (const int32_t status = spectrum.Transform(x + phase, present - phase, phases, table)) return status;
         const double turn = -6.283185307179586 * phase / static_cast<double>(total);
         const double angle = static_cast<double>(start % total) * turn;
         Complex rotor{std::cos(angle), std::sin(angle)};
         const Complex step{std::cos(turn), std::sin(turn)};
-        for (int32_t i = 0; i < count; ++i) {
-            y[i] += spectrum[static_cast<int32_t>((std::int64_t{i} + shift) % length)] * rotor;
+        for (int32_t i = 0, k = first; i < count; ++i) {
+            y[i] += spectrum[k] * rotor;
             rotor = rotor * step;
+            if (++k == length) k = 0;
         }
     }
     return kOk;
