@@ -2,11 +2,35 @@
 // 155, 1981). Neither divides by its window.
 #pragma once
 
+#include <algorithm>
+#include <cstddef>
 #include <cstdint>
+#include <utility>
 
 #include "frame/numeric.h"
 
 namespace krnumer {
+
+// Several moving sums side by side, so that the additions of one do not wait for those of another.
+template <class T, std::size_t... kStages>
+void NextMovingSums(std::index_sequence<kStages...>, T* x, int32_t n, int32_t window, int32_t position, T* sums,
+                    T* history) {
+    T sum[] = {sums[kStages]...};
+    for (int32_t i = 0; i < n; position = 0) {
+        const int32_t end = i + std::min(n - i, window - position);
+        for (T* ring = history + position; i < end; ++i, ++ring) {
+            T value = x[i];
+            const auto pass = [&value](T& oldest, T& running) {
+                const T change = value - oldest;
+                oldest = value;
+                value = running += change;
+            };
+            (pass(ring[kStages * Count(window)], sum[kStages]), ...);
+            x[i] = value;
+        }
+    }
+    ((sums[kStages] = sum[kStages]), ...);
+}
 
 // Runs x[0..n) through `stages` moving sums of width `window`, one after the other, in place. `sums` holds the sum of
 // each stage, a row of `history` its last inputs as a ring, in which `index` is the position of the next one; a
@@ -15,19 +39,16 @@ template <class T>
 void CascadedMovingSums(T* x, int32_t n, int32_t stages, int32_t window, T* sums, T* history, int32_t* index) {
     if (n < 1 || window < 1) return;
     const int32_t first = *index < window ? *index : 0;
-    for (int32_t stage = 0; stage < stages; ++stage) {
-        T* const ring = history + Count(stage) * Count(window);
-        T sum = sums[stage];
-        int32_t position = first;
-        for (int32_t i = 0; i < n; ++i) {
-            const T change = x[i] - ring[position];
-            ring[position] = x[i];
-            sum += change;
-            x[i] = sum;
-            if (++position == window) position = 0;
-        }
-        sums[stage] = sum;
-    }
+    const auto run = [&](auto together) {
+        NextMovingSums(together, x, n, window, first, sums, history);
+        sums += together.size();
+        history += together.size() * Count(window);
+        stages -= static_cast<int32_t>(together.size());
+    };
+    while (stages >= 4) run(std::make_index_sequence<4>());
+    if (stages == 3) run(std::make_index_sequence<3>());
+    if (stages == 2) run(std::make_index_sequence<2>());
+    if (stages == 1) run(std::make_index_sequence<1>());
     *index = static_cast<int32_t>((std::int64_t{first} + n) % window);
 }
 
