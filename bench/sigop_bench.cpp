@@ -1,5 +1,6 @@
-// Convolution beside plain loops and beside FFTW, planned once and run at the next length it is fast at; changes of the
-// sampling rate beside liquid-dsp, which computes in single precision, and beside a copy of the samples.
+// Convolution beside plain loops and beside FFTW, planned once and run at the next length it is fast at, with the table
+// of the transform held by someone else, as that plan is, and with none; changes of the sampling rate beside
+// liquid-dsp, which computes in single precision, and beside a copy of the samples.
 #include <benchmark/benchmark.h>
 
 #include <algorithm>
@@ -7,6 +8,7 @@
 #include <cstring>
 #include <vector>
 
+#include "fft/fft.h"
 #include "frame/numeric.h"
 #include "sigop/convolution.h"
 #include "sigop/convolution2d.h"
@@ -96,8 +98,9 @@ BENCHMARK(NaiveLoop<double>)->Apply(DirectLengths);
 BENCHMARK(DirectComplex)->Apply(DirectLengths);
 BENCHMARK(NaiveLoop<Complex>)->Apply(DirectLengths);
 
-void SpectralReal(benchmark::State& state) {
+void SpectralReal(benchmark::State& state, bool table_held) {
     Sequences<double> s(state);
+    const HeldTable table(table_held ? NextGoodLength(FullLength(s.nx, s.ny)) : 1);
     for (auto _ : state) {
         ConvolveReal(s.x.data(), s.nx, s.y.data(), s.ny, kFrequencyDomain, s.z.data());
         benchmark::DoNotOptimize(s.z.data());
@@ -109,7 +112,8 @@ void SpectralLengths(benchmark::internal::Benchmark* benchmark) {
     for (const auto& [nx, ny] : {std::pair{1000, 1000}, {100000, 1000}, {1000000, 1000000}}) benchmark->Args({nx, ny});
     benchmark->Unit(benchmark::kMicrosecond);
 }
-BENCHMARK(SpectralReal)->Apply(SpectralLengths);
+BENCHMARK_CAPTURE(SpectralReal, table_held, true)->Apply(SpectralLengths);
+BENCHMARK_CAPTURE(SpectralReal, table_built, false)->Apply(SpectralLengths);
 
 #ifdef KRNUMER_HAVE_FFTW
 

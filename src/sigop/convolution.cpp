@@ -26,10 +26,7 @@ int32_t ConvolveSpectra(const T* x, int32_t nx, const T* y, int32_t ny, T* z) {
     CopyPadded(y, ny, b, n);
     if (const int32_t status = Forward(table.get(), a, c, n)) return status;
     if (const int32_t status = Forward(table.get(), b, a, n)) return status;
-    MultiplySpectra(c, a, b, n);
-    if (const int32_t status = Inverse(table.get(), b, a, n)) return status;
-    std::copy_n(a, FullLength(nx, ny), z);
-    return kOk;
+    return InverseOfProduct(table.get(), c, a, n, b, z, FullLength(nx, ny));
 }
 
 // The shorter sequence is the kernel. The sums of real data follow x, those of complex data the longer sequence.

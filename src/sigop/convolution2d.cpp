@@ -56,8 +56,7 @@ class ColumnConvolution {
         if (const int32_t status = Forward(table_.get(), b, a, rows_)) return status;
         Gather(y, ry_, b);
         if (const int32_t status = Forward(table_.get(), b, c, rows_)) return status;
-        MultiplySpectra(a, c, b, rows_);
-        if (const int32_t status = Inverse(table_.get(), b, a, rows_)) return status;
+        if (const int32_t status = InverseOfProduct(table_.get(), a, c, rows_, b, a, rows_)) return status;
         for (int32_t r = 0; r < rows_; ++r) x.Set(r, a[r]);
         return kOk;
     }

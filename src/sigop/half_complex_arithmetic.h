@@ -19,4 +19,11 @@ void HalfComplexMultiply(const double* a, const double* b, double* out, int32_t 
 // a / b. The output may be an input too.
 void HalfComplexDivide(const double* a, const double* b, double* out, int32_t n);
 
+// a b / n, its real parts less and plus its imaginary parts: the Hartley transform of the product's sequence, whose
+// half-complex transform is that sequence but for CopyUnfolded. The output may not be an input.
+void HartleyMultiply(const double* a, const double* b, double* out, int32_t n);
+
+// The first `count` values of a sequence of n.
+void CopyUnfolded(const double* folded, int32_t n, double* x, int32_t count);
+
 }  // namespace krnumer

@@ -9,6 +9,7 @@
 
 #include "fft/fft.h"
 #include "frame/complex.h"
+#include "frame/status.h"
 #include "sigop/half_complex_arithmetic.h"
 
 namespace krnumer {
@@ -29,11 +30,23 @@ inline int32_t Inverse(const qmfft_table* table, Complex* spectrum, Complex* x, 
     return InverseComplexFFT(table, &spectrum->re, &spectrum->im, &x->re, &x->im, 2, 2, n);
 }
 
-inline void MultiplySpectra(const double* a, const double* b, double* out, int32_t n) {
-    HalfComplexMultiply(a, b, out, n);
+// The first `count` values of the inverse transform of the product of two spectra of n values. `work` holds n values.
+// b is scratch afterwards, and x may be a.
+inline int32_t InverseOfProduct(const qmfft_table* table, const double* a, double* b, int32_t n, double* work,
+                                double* x, int32_t count) {
+    HartleyMultiply(a, b, work, n);
+    if (const int32_t status = Forward(table, work, b, n)) return status;
+    CopyUnfolded(b, n, x, count);
+    return kOk;
 }
-inline void MultiplySpectra(const Complex* a, const Complex* b, Complex* out, int32_t n) {
-    for (int32_t k = 0; k < n; ++k) out[k] = a[k] * b[k];
+inline int32_t InverseOfProduct(const qmfft_table* table, const Complex* a, Complex* b, int32_t n, Complex* work,
+                                Complex* x, int32_t count) {
+    const double scale = 1.0 / n;
+    for (int32_t k = 0; k < n; ++k) work[k] = a[k] * b[k];
+    if (const int32_t status = Forward(table, work, b, n)) return status;
+    x[0] = b[0] * scale;
+    for (int32_t k = 1; k < count; ++k) x[k] = b[n - k] * scale;
+    return kOk;
 }
 
 // Fills up to n values with zeros.

@@ -12,6 +12,7 @@
 #include "frame/status.h"
 #include "sigop/half_complex_arithmetic.h"
 #include "sigop/signals.h"
+#include "sigop/spectrum.h"
 #include "support/numbers.h"
 #include "support/vector_units.h"
 
@@ -322,6 +323,24 @@ TEST(HalfComplex, ProductsAndQuotientsAreThoseOfTheComplexValues) {
         in_place = b;
         HalfComplexDivide(a.data(), in_place.data(), in_place.data(), n);
         EXPECT_THAT(in_place, SameBitsAs(quotient));
+    }
+}
+
+// The short way back from a product gives what multiplication and the inverse transform give.
+TEST(HalfComplex, ProductsGoBackByWayOfTheHartleyTransform) {
+    RandomSignals random;
+    for (int32_t n = 1; n < 40; ++n) {
+        const HeldTable table(n);
+        const auto a = Spectrum(random.Samples<double>(n));
+        const auto b = Spectrum(random.Samples<double>(n));
+        std::vector<double> product(a.size()), expected(a.size()), work(a.size());
+        HalfComplexMultiply(a.data(), b.data(), product.data(), n);
+        ASSERT_EQ(InverseRealFFT(table.get(), product.data(), expected.data(), 1, 1, n), 0);
+        for (int32_t count = 1; count <= n; ++count) {
+            std::vector<double> scratch = b, x(Count(count));
+            ASSERT_EQ(InverseOfProduct(table.get(), a.data(), scratch.data(), n, work.data(), x.data(), count), 0);
+            EXPECT_THAT(x, SameBitsAs(std::vector(expected.begin(), expected.begin() + count))) << n;
+        }
     }
 }
 
