@@ -13,15 +13,19 @@
  *
  * What all of them share:
  *
- *   y        ordinates, 1-D double; the fitted values on return unless only coefficients are wanted, and then as they
- * were x        abscissas, as many w        weights, as many, which count by magnitude and times the computed ones; or
- * empty tol      relative change (bisquare: of a coefficient; least absolute: of the residue) that is settled; 0.0001
- * where it is not above 0 init     start values of the preliminary fit in the order of the coefficients; empty, or not
- * finite, for the fit's own. Another length gives the warning 20010: a shorter array is ignored, of a longer one the
- * first values count residue  bisquare: mean square error with the caller's weights; least absolute: mean of |w (y -
- * f)|. Not written by a call that succeeds with coefficients alone iter     on entry the most passes, on return those
- * made msetol   mean square error (least absolute: residue too) that is good enough; 1e-12 where it is not above 0
- *   coefOnly not 0 for coefficients alone
+ *   y         ordinates, 1-D double; the fitted values on return, unless only coefficients are wanted
+ *   x         abscissas, as many
+ *   w         weights, as many, which count by magnitude and times the computed ones; or empty
+ *   tol       relative change that is settled, bisquare of a coefficient, least absolute of the residue; 0.0001 where
+ *             it is not above 0
+ *   init      start values of the preliminary fit in the order of the coefficients; empty, or not finite, for the fit's
+ *             own. Another length gives the warning 20010: a shorter array is ignored, of a longer one the first values
+ *             count
+ *   residue   bisquare: mean square error with the caller's weights; least absolute: mean of |w (y - f)|. Not written
+ *             by a call that succeeds with coefficients alone
+ *   iter      on entry the most passes, on return those made
+ *   msetol    mean square error that is good enough, and residue for least absolute; 1e-12 where it is not above 0
+ *   coefOnly  not 0 for coefficients alone
  *
  * A failure makes the scalars NaN, leaves `iter`, and empties y unless only coefficients are wanted. Statuses of all:
  * 0; -20002 when the arrays differ in length; -20006 for fewer than two points; -20068 for data that are not finite;
