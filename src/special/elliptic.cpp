@@ -27,22 +27,29 @@ struct Landen {
     double second;  // what E(phi | m) has beyond F(phi | m) E(m) / K(m)
 };
 
-// Descending Landen transformation of phi >= 0, 0 < m < 1.
+// Descending Landen transformation of phi >= 0, 0 < m < 1. Of the amplitude only its tangent is kept, and the half
+// periods that the tangent does not tell: a step adds two angles of tangent t and t b / a, whose sum passes a quarter
+// period where the denominator of the new tangent is negative.
+template <bool second_kind>
 Landen Descend(double phi, double m) {
     double a = 1.0, b = std::sqrt(1.0 - m), c = std::sqrt(m);
     double t = std::tan(phi), scale = 1.0, correction = 0.0;
     double halves = phi <= kHalfPi ? 0.0 : HalfPeriods(phi);  // one unit below pi / 2 the sum would round up
-    while (std::abs(c / a) > kEpsilon) {
+    while (c > kEpsilon * a) {
         const double ratio = b / a;
-        phi = phi + std::atan(t * ratio) + halves * kPi;
-        halves = HalfPeriods(phi);
-        t = t * (1.0 + ratio) / (1.0 - ratio * t * t);
+        const double numerator = t * (1.0 + ratio);
+        double denominator = 1.0 - ratio * t * t;
+        if (denominator == 0.0) denominator = 1e-30;  // the quarter period itself
+        halves += halves + std::copysign(static_cast<double>(denominator < 0.0), t);
+        t = numerator / denominator;
         c = (a - b) / 2.0;
         const double mean = std::sqrt(a * b);
         a = (a + b) / 2.0;
         b = mean;
         scale += scale;
-        correction += c * std::sin(phi);
+        if constexpr (second_kind) {  // c sin phi
+            correction += c * numerator / std::sqrt(numerator * numerator + denominator * denominator);
+        }
     }
     return {(std::atan(t) + halves * kPi) / (scale * a), correction};
 }
@@ -51,23 +58,30 @@ bool InDomain(double m) {
     return m >= 0.0 && m <= 1.0;
 }
 
+// K and E of t = 1 - m and its logarithm, 0 < t <= 1.
+double CompleteK(double t, double ln_t) {
+    if (t <= 7e-06) return 1.3862943611198906 - 0.5 * ln_t;
+    return PolyEval(t, kEllipticKP) - ln_t * PolyEval(t, kEllipticKQ);
+}
+
+double CompleteE(double t, double ln_t) {
+    return PolyEval(t, kEllipticEP) - ln_t * t * PolyEval(t, kEllipticEQ);
+}
+
 }  // namespace
 
 double EllipticK(double m) {
     if (!std::isfinite(m)) return kQuietNaN;
     if (!InDomain(m)) return DomainError(kQuietNaN);
     if (m == 1.0) return DomainError(kInfinity);
-    const double t = 1.0 - m;
-    if (t <= 7e-06) return 1.3862943611198906 - 0.5 * std::log(t);
-    return PolyEval(t, kEllipticKP) - std::log(t) * PolyEval(t, kEllipticKQ);
+    return CompleteK(1.0 - m, std::log(1.0 - m));
 }
 
 double EllipticE(double m) {
     if (!std::isfinite(m)) return kQuietNaN;
     if (!InDomain(m)) return DomainError(kQuietNaN);
-    const double t = 1.0 - m;
-    if (t == 0.0) return 1.0;
-    return PolyEval(t, kEllipticEP) - std::log(t) * t * PolyEval(t, kEllipticEQ);
+    if (m == 1.0) return 1.0;
+    return CompleteE(1.0 - m, std::log(1.0 - m));
 }
 
 double EllipticF(double phi, double m) {
@@ -86,7 +100,7 @@ double EllipticF(double phi, double m) {
     if (m == 0.0) return phi;
     if (std::abs(size - kHalfPi) < kEpsilon) return Signed(EllipticK(m), phi);
     if (m == 1.0) return Signed(std::log(std::tan((size + kHalfPi) / 2.0)), phi);
-    return Signed(Descend(size, m).first, phi);
+    return Signed(Descend<false>(size, m).first, phi);
 }
 
 double EllipticE(double phi, double m) {
@@ -105,8 +119,9 @@ double EllipticE(double phi, double m) {
     if (fraction < kNear * quarters || 1.0 - fraction < kNear * quarters) {
         return Signed(EllipticE(m) * quarters, phi);
     }
-    const Landen landen = Descend(size, m);
-    return Signed(EllipticE(m) / EllipticK(m) * landen.first + landen.second, phi);
+    const Landen landen = Descend<true>(size, m);
+    const double t = 1.0 - m, ln_t = std::log(t);
+    return Signed(CompleteE(t, ln_t) / CompleteK(t, ln_t) * landen.first + landen.second, phi);
 }
 
 }  // namespace krnumer

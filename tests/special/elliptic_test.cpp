@@ -76,6 +76,19 @@ TEST(EllipticF, IsAMultipleOfTheQuarterPeriod) {
     EXPECT_THAT(F(std::nextafter(kHalfPi, 0.0), 0.5), Near(quarter, 4 * kEpsilon));
 }
 
+// Where F = K / 2, tan^2 phi sqrt(1 - m) is 1, and a step of the Landen transformation meets a quarter period. For some
+// of these doubles it does so exactly.
+TEST(EllipticF, CrossesHalfTheQuarterPeriod) {
+    for (const double m : {0.123, 0.25, 0.3, 0.5, 0.9}) {
+        const double complement = std::sqrt(1.0 - m), middle = std::atan(1.0 / std::sqrt(std::sqrt(1.0 - m)));
+        for (int i = -40; i <= 40; ++i) {
+            const double phi = middle + i * 0x1p-53;
+            EXPECT_THAT(F(phi, m), Near(K(m) / 2, 3e-14)) << phi << " " << m;
+            EXPECT_THAT(E(phi, m), Near((E(m) + 1.0 - complement) / 2, 3e-14)) << phi << " " << m;
+        }
+    }
+}
+
 TEST(EllipticF, IsInfiniteForMOfOneBeyondAQuarter) {
     EXPECT_THAT(F(1.0, 1.0), Near(std::log(std::tan(0.5 + kHalfPi / 2)), 1e-15));
     EXPECT_EQ(F(-1.0, 1.0), -F(1.0, 1.0));
