@@ -13,10 +13,22 @@ namespace krnumer {
 namespace {
 
 constexpr double kStirlingFrom = 33.0;
+constexpr int32_t kLargestFactorial = 170;
 constexpr double kLargestPower = 143.01608;  // beyond, x^(x - 1/2) overflows
 constexpr double kLargestExponent = 709.782712893384;
 constexpr double kSqrtTwoPi = 2.5066282746310007;
 constexpr double kLnSqrtTwoPi = 0.9189385332046728;
+
+// Moves x >= 3 to 2 <= x < 3, and gives (x - 1) (x - 2) ... down to there. With the steps counted beforehand the
+// processor need not wait for x to find the end of the loop.
+double Descend(double& x) {
+    double product = 1.0;
+    for (int32_t steps = static_cast<int32_t>(x) - 2; steps > 0; --steps) {
+        x -= 1.0;
+        product *= x;
+    }
+    return product;
+}
 
 // Gamma(x) Gamma(-x) = -pi / (x sin(pi x)) for x below -33.
 double ReflectedGamma(double x) {
@@ -31,6 +43,31 @@ double ReflectedGamma(double x) {
     return kPi / (std::abs(z) * Stirling(size)) * sign;
 }
 
+double ComputedFactorial(int32_t n) {
+    if (n < 34) return kFactorials[n];
+    if (n >= 51) return Gamma(n + 1.0);
+    double product = kFactorials[33];
+    for (int32_t k = n; k >= 34; --k) product *= k;
+    return product;
+}
+
+double ComputedLnFactorial(int32_t n) {
+    return n == 1 ? 0.0 : LnGamma(n + 1.0);
+}
+
+// The values of a function of n = 0, 1, ..., as far as n! is finite.
+template <double (*function)(int32_t)>
+class Table {
+  public:
+    Table() {
+        for (int32_t n = 0; n <= kLargestFactorial; ++n) values_[n] = function(n);
+    }
+    double operator[](int32_t n) const { return values_[n]; }
+
+  private:
+    double values_[kLargestFactorial + 1];
+};
+
 }  // namespace
 
 double Gamma(double x) {
@@ -38,11 +75,7 @@ double Gamma(double x) {
     if (x == kInfinity) return x;
     if (std::abs(x) > kStirlingFrom) return x > 0.0 ? Stirling(x) : ReflectedGamma(x);
 
-    double factor = 1.0;
-    while (x >= 3.0) {
-        x -= 1.0;
-        factor *= x;
-    }
+    double factor = Descend(x);
     while (x < 2.0) {
         if (std::abs(x) < 1e-9) {
             return x == 0.0 ? DomainError(kQuietNaN) : factor / ((1.0 + kEulerGamma * x) * x);
@@ -85,11 +118,7 @@ double LnGamma(double x) {
         if (x < 1000.0) return PolyEval(p, kLnGammaA) / x + leading;
         return ((0.0007936507936507937 * p - 0.002777777777777778) * p + 0.08333333333333333) / x + leading;
     }
-    double factor = 1.0;
-    while (x >= 3.0) {
-        x -= 1.0;
-        factor *= x;
-    }
+    double factor = Descend(x);
     while (x < 2.0) {
         if (x == 0.0) return DomainError(kInfinity);
         factor /= x;
@@ -108,16 +137,14 @@ double ReciprocalGamma(double x) {
 
 double Factorial(int32_t n) {
     if (n < 0) return DomainError(kQuietNaN);
-    if (n < 34) return kFactorials[n];
-    if (n >= 51) return Gamma(n + 1.0);
-    double product = kFactorials[33];
-    for (int32_t k = n; k >= 34; --k) product *= k;
-    return product;
+    static const Table<ComputedFactorial> table;
+    return n <= kLargestFactorial ? table[n] : kInfinity;
 }
 
 double LnFactorial(int32_t n) {
     if (n < 0) return DomainError(kQuietNaN);
-    return n == 1 ? 0.0 : LnGamma(n + 1.0);
+    static const Table<ComputedLnFactorial> table;
+    return n <= kLargestFactorial ? table[n] : ComputedLnFactorial(n);
 }
 
 double Digamma(double x) {
@@ -130,19 +157,17 @@ double Digamma(double x) {
         x = 1.0 - x;
     }
     double psi;
-    if (x <= 10.0 && x == std::floor(x)) {
-        double harmonic = 0.0;
+    const int32_t whole = x <= 10.0 ? static_cast<int32_t>(x) : 10;
+    double harmonic = 0.0;
+    if (x == whole) {
         for (double i = 1.0; i < x; i += 1.0) harmonic += 1.0 / i;
         psi = -kEulerGamma + harmonic;
     } else {
-        double s = x, harmonic = 0.0;
-        for (; s < 10.0; s += 1.0) harmonic += 1.0 / s;
-        double series = 0.0;
-        if (s < 1e9) {
-            const double z = 1.0 / (s * s);
-            series = z * PolyEval(z, kPsiA);
-        }
-        psi = std::log(s) - 0.5 / s - series - harmonic;
+        double s = x;
+        for (int32_t steps = 10 - whole; steps > 0; --steps, s += 1.0) harmonic += 1.0 / s;
+        const double reciprocal = 1.0 / s, z = reciprocal * reciprocal;
+        const double series = s < 1e9 ? z * PolyEval(z, kPsiA) : 0.0;
+        psi = std::log(s) - 0.5 * reciprocal - series - harmonic;
     }
     return reflected ? psi - kPi / std::tan(kPi * (1.0 - x)) : psi;
 }
