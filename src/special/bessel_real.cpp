@@ -21,12 +21,10 @@ constexpr double kLargestInteger = 2147483647.0;
 // The power series in -x^2 / 4.
 double JvSeries(double v, double x) {
     const double y = -(x * x) / 4.0;
-    double term = 1.0, sum = 1.0, k = 1.0, change = 1.0;
-    while (change >= kEpsilon) {
+    double term = 1.0, sum = 1.0;
+    for (double k = 1.0; std::abs(term) >= kEpsilon * std::abs(sum) && term != 0.0; k += 1.0) {
         term *= y / ((k + v) * k);
         sum += term;
-        k += 1.0;
-        if (sum != 0.0) change = std::abs(term / sum);
     }
     if (x >= 0.0 && v >= -1.0) return sum * std::exp(v * std::log(x / 2.0) - LnGamma(v + 1.0));
     return sum * std::pow(0.5 * x, v) / Gamma(v + 1.0);
@@ -76,7 +74,7 @@ Recurrence JvRecur(double n, double x, double k) {
     }
     double above = 1.0, value = 1.0 / start, order = n - 1.0;
     do {
-        const double next = (2.0 * order * value - x * above) / x;
+        const double next = 2.0 * order / x * value - above;
         above = value;
         value = next;
         order -= 1.0;
@@ -110,7 +108,7 @@ double ByRecurrence(double v, double x) {
 double BesselJ(double v, double x) {
     if (!std::isfinite(x) || !std::isfinite(v)) return kQuietNaN;
     const double size = std::abs(v);
-    const bool is_integer = v == std::floor(v);
+    const bool is_integer = IsWhole(v);
     if (v < kLeastOrder && !is_integer) return DomainError(kQuietNaN);
     double sign = 1.0;
     if (is_integer) {
@@ -135,7 +133,7 @@ double BesselY(double v, double x) {
     if (x <= 0.0) return DomainError(kQuietNaN);
     if (!(std::abs(v) <= kLargestInteger + 1.0)) return DomainError(kQuietNaN);
     if (std::abs(v - std::floor(v)) < 1e-8) {
-        if (v == std::floor(v)) {
+        if (IsWhole(v)) {
             if (v > kLargestInteger) return DomainError(kQuietNaN);
             return v < 0.0 && IsOdd(v) ? -BesselYn(-v, x) : BesselYn(std::abs(v), x);
         }

@@ -131,7 +131,7 @@ double LnGamma(double x) {
 }
 
 double ReciprocalGamma(double x) {
-    if (x <= 0.0 && x == std::floor(x)) return 0.0;
+    if (x <= 0.0 && IsWhole(x)) return 0.0;
     return 1.0 / Gamma(x);
 }
 

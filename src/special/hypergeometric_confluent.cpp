@@ -15,31 +15,32 @@ namespace {
 
 constexpr double kLargest = std::numeric_limits<double>::max();
 
-// Whether their product would overflow. The first test only spares a division.
-bool Overflows(double factor, double largest) {
-    if (std::abs(factor) < 1e150 && largest < 1e150) return false;
-    return std::abs(factor) > 1.0 && largest > kLargest / std::abs(factor);
+// How many steps of 1 lead to 0, at most one more than the series has passes.
+int32_t StepsToZero(double x) {
+    return x <= 0.0 && x >= -kMostPasses && IsWhole(x) ? static_cast<int32_t>(-x) : kMostPasses + 1;
 }
 
 // The power series of M. It ends at the first of its terms that is below eps itself.
 Estimate Hy1F1Series(double a, double b, double x) {
-    double term = 1.0, sum = 1.0, largest = 0.0, n = 1.0;
-    while (std::abs(term) > kEpsilon) {
-        if (b == 0.0) return {DomainError(kInfinity), 0.0};
-        if (a == 0.0) return {sum, 0.0};
-        if (n > kMostPasses) break;
-        const double ratio = x * (a / (b * n));
-        if (Overflows(ratio, largest)) return {sum, 1.0};
-        term *= ratio;
+    const int32_t last_of_a = StepsToZero(a), last_of_b = StepsToZero(b);
+    const double most = std::min({last_of_a, last_of_b, kMostPasses});
+    double term = 1.0, sum = 1.0, size = 1.0, largest = 0.0, n = 1.0;
+    for (; n <= most && size > kEpsilon; n += 1.0) {
+        const double before = sum;
+        term *= x * (a / (b * n));
         sum += term;
-        largest = std::max(largest, std::abs(term));
+        size = std::abs(term);
+        if (size == kInfinity) return {n > 1.0 ? before : sum, 1.0};
+        largest = std::max(largest, size);
         a += 1.0;
         b += 1.0;
-        n += 1.0;
     }
+    const bool cut_short = size > kEpsilon;
+    if (cut_short && b == 0.0) return {DomainError(kInfinity), 0.0};
+    if (cut_short && a == 0.0) return {sum, 0.0};
     const double cancelled = sum != 0.0 ? largest / std::abs(sum) : largest;
     const double rounding = std::abs(kEpsilon * n + kEpsilon * cancelled);
-    return {sum, n > kMostPasses ? std::max(rounding, std::abs(term / sum)) : rounding};  // cut short, or at its end
+    return {sum, cut_short ? std::max(rounding, std::abs(term / sum)) : rounding};
 }
 
 // Which of the two asymptotic series of M a factor stands for; their converging factors differ.
@@ -52,7 +53,7 @@ Estimate Hyp2F0(const double a, const double b, const double x, Asymptotic kind)
     do {
         if (an == 0.0 || bn == 0.0) break;
         const double ratio = an * (bn * x / n);
-        if (Overflows(ratio, largest)) return {sum, kLargest};
+        if (largest * std::abs(ratio) > kLargest) return {sum, kLargest};
         term *= ratio;
         size = std::abs(term);
         if (size > previous || n > kMostPasses) {
@@ -103,7 +104,7 @@ Estimate Hy1F1Asym(double a, double b, double x) {
 // M(a, b, +infinity): the sign of its leading term, Gamma(b) / Gamma(a) e^x x^(a - b) or that of the polynomial.
 double KummerAtInfinity(double a, double b) {
     if (a == 0.0) return b == 0.0 ? DomainError(kInfinity) : 1.0;
-    const auto is_pole = [](double z) { return z <= 0.0 && z == std::floor(z); };
+    const auto is_pole = [](double z) { return z <= 0.0 && IsWhole(z); };
     const auto is_negative = [](double z) { return z < 0.0 && IsOdd(std::floor(z)); };  // Gamma
     if (is_pole(b) && !(is_pole(a) && a > b)) return DomainError(kInfinity);
     if (!is_pole(a)) return is_negative(a) == is_negative(b) ? kInfinity : -kInfinity;

@@ -12,7 +12,7 @@ namespace {
 
 // sqrt(pi) / Gamma(z) by Stirling's series from 3 on; 0 at the poles of Gamma.
 double GammaRatio(double z) {
-    if (z <= 0.0 && z == std::floor(z)) return 0.0;
+    if (z <= 0.0 && IsWhole(z)) return 0.0;
     double product = 1.0;
     while (z < 3.0 && std::isfinite(product)) {
         product *= z;
@@ -27,7 +27,7 @@ double GammaRatio(double z) {
 double AtMinusInfinity(double v) {
     if (v == kInfinity) return DomainError(kQuietNaN);
     if (v < 0.0) return DomainError(kInfinity);
-    if (v == std::floor(v)) return DomainError(0.0);
+    if (IsWhole(v)) return DomainError(0.0);
     return DomainError(IsOdd(std::trunc(v)) ? kInfinity : -kInfinity);  // the sign of Gamma(-v)
 }
 

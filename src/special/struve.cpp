@@ -35,7 +35,7 @@ double OfPositive(double v, double x) {
 double Struve(double v, double x) {
     if (!std::isfinite(x) || std::isnan(v)) return kQuietNaN;
     if (x == 0.0 && v < 0.0) return DomainError(kQuietNaN);
-    if (x < 0.0 && v != std::floor(v)) return DomainError(kQuietNaN);
+    if (x < 0.0 && !IsWhole(v)) return DomainError(kQuietNaN);
     if (x == 0.0) return 0.0;
     if (std::isinf(v)) return kQuietNaN;
     const double whole = std::floor(v);

@@ -5,6 +5,7 @@
 
 #include "special/domain.h"
 #include "special/gamma.h"
+#include "special/parity.h"
 #include "special/polynomial.h"
 #include "special/zeta_coefficients.h"
 
@@ -35,7 +36,7 @@ double Zeta(double x) {
     if (x < -30.8148) return DomainError(0.0);
     if (x < 0.0) return ReflectedZeta(x);
     if (x >= 127.0) return 1.0;
-    if (x <= 30.0 && x == std::floor(x)) {
+    if (x <= 30.0 && IsWhole(x)) {
         return x == 1.0 ? DomainError(kInfinity) : kZetaLessOne[static_cast<int32_t>(x)] + 1.0;
     }
     if (x < 1.0) return PolyEval(x, kZetaR) / ((1.0 - x) * PolyEvalMonic(x, kZetaS)) + 1.0;
