@@ -300,8 +300,8 @@ KRNUMER_API void KR_Gauss(double x, double a, double b, double c, double* out);
  * above 0 and parameters up to 6. For negative x the series cancels: absolute error 1e-7 at -12, relative error of
  * M(1.5, 2.5, x) 2e-10 at -15, 4e-8 at -20, 2e-4 at -29.9 and 1e-12 from -30 down.
  *
- * +infinity for b = 0, -1, ... unless a ends the series before; an infinity with the sign of the leading term at x =
- * +infinity. NaN for infinite a or b, unless a = b and x = +infinity.
+ * +infinity for b = 0, -1, ... unless a ends the series before; at infinite x the limit, 0 or an infinity with the sign
+ * of the leading term. NaN for infinite a or b, unless a = b and x = +infinity.
  *
  * @param[in]  x    argument
  * @param[in]  a    numerator parameter

@@ -101,16 +101,29 @@ Estimate Hy1F1Asym(double a, double b, double x) {
     return {value, 30.0 * error};
 }
 
-// M(a, b, +infinity): the sign of its leading term, Gamma(b) / Gamma(a) e^x x^(a - b) or that of the polynomial.
-double KummerAtInfinity(double a, double b) {
-    if (a == 0.0) return b == 0.0 ? DomainError(kInfinity) : 1.0;
-    const auto is_pole = [](double z) { return z <= 0.0 && IsWhole(z); };
-    const auto is_negative = [](double z) { return z < 0.0 && IsOdd(std::floor(z)); };  // Gamma
-    if (is_pole(b) && !(is_pole(a) && a > b)) return DomainError(kInfinity);
-    if (!is_pole(a)) return is_negative(a) == is_negative(b) ? kInfinity : -kInfinity;
-    // (a)_n / (b)_n with n = -a: the first has the sign of (-1)^n, the second one - for every negative factor.
-    const double negative_factors = b < 0.0 ? std::min(-a, std::ceil(-b)) : 0.0;
-    return IsOdd(negative_factors - a) ? -kInfinity : kInfinity;
+bool IsPole(double z) {
+    return z <= 0.0 && IsWhole(z);
+}
+
+// Of Gamma(z).
+bool IsNegative(double z) {
+    return z < 0.0 && IsOdd(std::floor(z));
+}
+
+// The limit of M at an infinite x. Its leading term is that of the polynomial for a = -n, otherwise for x > 0
+// Gamma(b) / Gamma(a) e^x x^(a - b), for x < 0 Gamma(b) / Gamma(b - a) (-x)^-a.
+double KummerAtInfinity(double a, double b, double x) {
+    if (IsPole(b) && !(IsPole(a) && a > b)) return DomainError(kInfinity);
+    if (a == 0.0) return 1.0;
+    bool is_negative;
+    if (IsPole(a)) {  // the sign of x^n (a)_n / (b)_n, of whose denominator every negative factor counts
+        const double negative_factors = b < 0.0 ? std::min(-a, std::ceil(-b)) : 0.0;
+        is_negative = IsOdd(negative_factors - (x > 0.0 ? a : 0.0));
+    } else {
+        if (x < 0.0 && (a > 0.0 || IsPole(b - a))) return 0.0;
+        is_negative = IsNegative(b) != IsNegative(x > 0.0 ? a : b - a);
+    }
+    return is_negative ? -kInfinity : kInfinity;
 }
 
 // U by M, for b that is no integer.
@@ -150,7 +163,7 @@ double TricomiAsymptotic(double a, double b, double x) {
 double KummerM(double a, double b, double x) {
     if (std::isnan(a) || std::isnan(b) || std::isnan(x)) return kQuietNaN;
     if (std::isinf(a) || std::isinf(b)) return x == kInfinity && a == b ? std::exp(x) : kQuietNaN;
-    if (x == kInfinity) return KummerAtInfinity(a, b);
+    if (std::isinf(x)) return KummerAtInfinity(a, b, x);
     const double difference = b - a;
     if (std::abs(difference) < 0.0001220703125 * std::abs(a)) return std::exp(x) * KummerM(difference, b, -x);
 

@@ -140,7 +140,18 @@ TEST(Kummer, KnowsInfiniteX) {
     EXPECT_EQ(M(1.0, -0.5, kInfinity), -kInfinity);
     EXPECT_EQ(M(-2.0, 3.0, kInfinity), kInfinity);
     EXPECT_EQ(M(-3.0, 3.0, kInfinity), -kInfinity);
+    EXPECT_EQ(M(0.0, 3.0, kInfinity), 1.0);
+    EXPECT_EQ(M(0.0, 0.0, kInfinity), kInfinity);
     EXPECT_EQ(M(kInfinity, kInfinity, kInfinity), kInfinity);
+    for (const double a : {1.0, 0.5, 3.0, 1e300}) EXPECT_EQ(M(a, 1.0, -kInfinity), 0.0) << a;
+    EXPECT_EQ(M(-0.5, -2.5, -kInfinity), 0.0);
+    EXPECT_EQ(M(0.0, 3.0, -kInfinity), 1.0);
+    EXPECT_EQ(M(1.0, -1.0, -kInfinity), kInfinity);
+    for (const double a : {-0.5, -1.0, -2.0, -3.0, -3.5}) {
+        for (const double b : {2.0, 0.5, -1.25, -1.75, -3.25}) {
+            EXPECT_EQ(M(a, b, -kInfinity), std::copysign(kInfinity, M(a, b, -1e6))) << a << " " << b;
+        }
+    }
     EXPECT_THAT(M(kInfinity, kInfinity, 1.0), QuietNaN());
     EXPECT_THAT(M(kInfinity, 1.0, kInfinity), QuietNaN());
     EXPECT_THAT(M(1.0, -kInfinity, 1.0), QuietNaN());
