@@ -232,7 +232,8 @@ KRNUMER_API void KR_SinhI(double x, double* out);
  *
  * K: a polynomial pair in 1 - m, and ln 4 - ln(1 - m) / 2 from 1 - m = 7e-6 down. Relative error 2 eps, in the latter
  * range 1.5e-6 at its edge, 2e-9 at 1e-8. F: descending Landen transformation within a quarter period, relative error 4
- * eps; beyond a quarter multiples of K are added, with the error of K.
+ * eps, but for m = 1 ln tan(x / 2 + pi / 4), absolute error 3e-16; beyond a quarter multiples of K are added, with the
+ * error of K.
  *
  * K(1) is +infinity, and so is F(x | 1) beyond a quarter period, with the sign of x. NaN for m outside 0 to 1, for
  * infinite arguments, and for |x| above 3.3e9.
@@ -278,7 +279,8 @@ KRNUMER_API void KR_EllipticJ(double u, double m, double* sn, double* cn, double
  *
  * Power series of at most 200 terms, directly or after a transformation to x / (x - 1) below -0.5, to 1 - x above 0.9
  * (with the psi function where c - a - b is an integer), by Euler's transformation where it ends the series, or by
- * recurrence from larger c. Relative error 1e-13 for parameters up to 5, 1e-11 up to 30.
+ * recurrence from larger c. Relative error 1e-13 for parameters up to 5, 1e-11 up to 30; above 0.9 up to 5e-7 where
+ * c - a - b is no integer but within 1e-3 of one.
  *
  * +infinity for |x| above 1 unless a or b is 0 or a negative integer, at x = 1 for c - a - b <= 0, and for c = 0, -1,
  * ... unless a or b ends the series before. Within 2^-28 a parameter counts as an integer. NaN for arguments that are
@@ -472,8 +474,9 @@ KRNUMER_API void KR_KelvinI(double x, int32_t n, double* ber, double* bei);
  * for x > 0.
  *
  * Power series (9.9.11 and 9.9.12 of the same source), whose parts grow while the functions fall: relative error 1e-12
- * up to 2, 3e-9 at 10, 2e-4 at 15, no digit from 25 on. An infinity for orders whose (x / 2)^n / n! underflows. NaN for
- * x <= 0, from about 75 on and for infinite x.
+ * up to 2, 3e-9 at 10, 2e-4 at 15, no digit from 25 on. In ker for n = 2, 6, ... and in kei for n = 4, 8, ... the
+ * largest term for small x has a factor 0, a rounded cosine here: relative error up to 2e-14 / x^2. An infinity for
+ * orders whose (x / 2)^n / n! underflows. NaN for x <= 0, from about 75 on and for infinite x.
  *
  * @param[in]  x    x > 0
  * @param[in]  n    order
@@ -504,8 +507,9 @@ KRNUMER_API void KR_Airy(double x, double* ai, double* bi, double* aiPrime, doub
  * Struve function, H_v(x). Note the order of the arguments.
  *
  * A power series below 18, from 18 on also an asymptotic series with Y_v, whichever estimates the smaller error; J_-v
- * for v = -1/2, -3/2, .... Relative error 1e-10 for x up to 15 and from 31 on, 1e-9 between. For x from 18 on and v
- * above x / 1.5 the asymptotic series misjudges itself, and digits are lost up to all of them.
+ * for v = -1/2, -3/2, .... Relative error 1e-10 for x up to 15 and from 31 on, 1e-9 between. For v above x the power
+ * series cancels, 1e-9 at x = 70, and from there on the asymptotic series misjudges itself: no digit from x = 80 and
+ * v = 1.1 x on.
  *
  * H_n(-x) = (-1)^(n + 1) H_n(x) for integers. 0 at x = 0 for v >= 0. NaN for negative x where v is no integer, for x =
  * 0 with negative v, from v = 170.13 on, where gamma functions overflow, and for infinite arguments.

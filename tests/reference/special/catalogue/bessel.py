@@ -84,6 +84,8 @@ FIRST_KIND = [
     Region("negative v", every(not_integer(-60, 0), uniform(60.0, 400.0)), [(-2.25, 30.0)]),
     Region("negative v, small x", every(not_integer(-10, 0), uniform(0.5, 30.0))),
     Region("huge x", every(not_integer(0, 20), log_uniform(1e5, 1e8)), note="the phase loses digits"),
+    Region("integer v, huge x", every(as_float(integer(0, 5)), log_uniform(1e4, 1e12)), in_golden=False,
+           note="the phase loses digits"),
 ]
 
 SECOND_KIND = [
@@ -105,6 +107,8 @@ KELVIN = [
 ]
 
 KELVIN_SECOND = [
+    Region("below 0.05", every(integer(-5, 5), log_uniform(1e-6, 0.05)), in_golden=False,
+           note="factors that are 0 for even n are 1e-16"),
     Region("to 2", every(integer(-5, 5), log_uniform(0.05, 2.0)), [(n, 2.0) for n in range(-3, 6)]),
     Region("2 to 10", every(integer(0, 5), uniform(2.0, 10.0)), note="growing parts cancel"),
     Region("10 to 15", every(integer(0, 5), uniform(10.0, 15.0)), note="growing parts cancel"),
@@ -179,7 +183,7 @@ FUNCTIONS = [
         Region("above 30", every(uniform(0.0, 20.0), uniform(31.0, 200.0)), [(0.0, 40.0), (1.0, 50.0), (2.5, 40.0)]),
         Region("large v", every(uniform(20.0, 160.0), uniform(1.0, 18.0))),
         Region("v near and above x", order_and_argument(uniform(20.0, 160.0), uniform(0.5, 1.5)), in_golden=False,
-               note="the asymptotic series misjudges itself"),
+               note="the power series cancels, the asymptotic one misjudges itself"),
         Region("negative x", every(as_float(integer(0, 6)), uniform(-60.0, 0.0)), [(1.0, -50.0)]),
         Region("negative v", every(not_integer(-6, 0), uniform(0.5, 60.0))),
         Region("negative half-integers", every(lambda rng: 0.5 - rng.randint(1, 10), uniform(0.5, 60.0))),

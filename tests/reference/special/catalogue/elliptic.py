@@ -15,22 +15,27 @@ def complement(low, high):
     return lambda rng: 1.0 - draw(rng)
 
 
-COMPLETE = [
-    Region("0 to 0.9", uniform(0.0, 0.9), [0.0, 0.5, 5e-324]),
-    Region("0.9 to 1 - 7e-6", complement(7.1e-6, 0.1), [1.0 - 7.1e-6]),
-    Region("from 1 - 7e-6", complement(1e-15, 6.9e-6), [1.0 - 6.999e-6], note="K is the bare logarithm"),
-]
+def complete(near_one):
+    return [
+        Region("0 to 0.9", uniform(0.0, 0.9), [0.0, 0.5, 5e-324]),
+        Region("0.9 to 1 - 7e-6", complement(7.1e-6, 0.1), [1.0 - 7.1e-6]),
+        Region("from 1 - 7e-6", complement(1e-15, 6.9e-6), [1.0 - 6.999e-6], note=near_one),
+    ]
 
-INCOMPLETE = [
-    Region("quarter period", every(uniform(-HALF_PI, HALF_PI), uniform(0.0, 0.99)),
-           [(phi, 0.5) for phi in (*around(HALF_PI)[:2], *around(-HALF_PI)[1:], 1e-300, 1.0)]),
-    Region("several periods", every(uniform(-12.0, 12.0), uniform(0.0, 0.99)),
-           [(k * HALF_PI, 0.5) for k in (2, 3, 4, 5, 6, 7, -3, -4)] + [(math.nextafter(HALF_PI, 2.0), 0.5)]),
-    Region("many periods", every(uniform(100.0, 1e5), uniform(0.0, 0.99))),
-    Region("m near 1", every(uniform(0.0, HALF_PI), complement(1e-12, 1e-2)), note="E stands on K"),
-    Region("m near 1, several periods", every(uniform(2.0, 12.0), complement(1e-10, 1e-5)), note="multiples of K"),
-    Region("m = 0", every(uniform(-10.0, 10.0), lambda rng: 0.0)),
-]
+
+def incomplete(near_one, at_one):
+    return [
+        Region("quarter period", every(uniform(-HALF_PI, HALF_PI), uniform(0.0, 0.99)),
+               [(phi, 0.5) for phi in (*around(HALF_PI)[:2], *around(-HALF_PI)[1:], 1e-300, 1.0, 0.8716111622538728)]),
+        Region("several periods", every(uniform(-12.0, 12.0), uniform(0.0, 0.99)),
+               [(k * HALF_PI, 0.5) for k in (2, 3, 4, 5, 6, 7, -3, -4)] + [(math.nextafter(HALF_PI, 2.0), 0.5)]),
+        Region("many periods", every(uniform(100.0, 1e5), uniform(0.0, 0.99))),
+        Region("m near 1", every(uniform(0.0, HALF_PI), complement(1e-12, 1e-2)), note=near_one),
+        Region("m near 1, several periods", every(uniform(2.0, 12.0), complement(1e-10, 1e-5)),
+               note="multiples of K"),
+        Region("m = 0", every(uniform(-10.0, 10.0), lambda rng: 0.0)),
+        Region("m = 1", every(log_uniform(1e-10, 1.57), lambda rng: 1.0), in_golden=False, note=at_one),
+    ]
 
 
 def within_quarter(u_of_k, m_of):
@@ -67,10 +72,13 @@ def jacobi_function(i, name):
 
 
 FUNCTIONS = [
-    Function("elliptic_k", "K(m)", "KR_Elliptic1", "dd", mp.ellipk, COMPLETE, pack=lambda m: (m, NAN)),
-    Function("elliptic_e", "E(m)", "KR_Elliptic2", "dd", mp.ellipe, COMPLETE, pack=lambda m: (m, NAN)),
-    Function("elliptic_f_phi", "F(φ | m)", "KR_Elliptic1", "dd", mp.ellipf, INCOMPLETE, pack=lambda p, m: (m, p)),
-    Function("elliptic_e_phi", "E(φ | m)", "KR_Elliptic2", "dd", mp.ellipe, INCOMPLETE, pack=lambda p, m: (m, p)),
+    Function("elliptic_k", "K(m)", "KR_Elliptic1", "dd", mp.ellipk, complete("the bare logarithm"),
+             pack=lambda m: (m, NAN)),
+    Function("elliptic_e", "E(m)", "KR_Elliptic2", "dd", mp.ellipe, complete(""), pack=lambda m: (m, NAN)),
+    Function("elliptic_f_phi", "F(φ | m)", "KR_Elliptic1", "dd", mp.ellipf,
+             incomplete("", "the logarithm of a tangent near 1"), pack=lambda p, m: (m, p)),
+    Function("elliptic_e_phi", "E(φ | m)", "KR_Elliptic2", "dd", mp.ellipe,
+             incomplete("E stands on K", ""), pack=lambda p, m: (m, p)),
     *(jacobi_function(i, name) for i, name in enumerate(("sn", "cn", "dn", "am"))),
     Function("dilogarithm", "Li₂(1 − x)", "KR_Diln", "d", lambda x: mp.polylog(2, 1 - x), regions=[
         Region("to 0.5", log_uniform(1e-300, 0.5), around(0.5)),

@@ -4,7 +4,7 @@ import math
 
 import mpmath as mp
 
-from . import Function, Region, every, integer, log_uniform, uniform
+from . import Function, Region, every, integer, log_uniform, near_integer, uniform
 
 
 def fixed(value):
@@ -51,6 +51,9 @@ GAUSS = [
                                                                 uniform(0.9, 1.0)), [(1.3, 0.7, 4.0, 0.95)])),
     positive_c(Region("0.9 to 1, d a negative integer", gauss_arguments(eighths(0, 4), eighths(0, 4), integer(-3, -1),
                                                                         uniform(0.9, 1.0)))),
+    positive_c(Region("0.9 to 1, d near an integer", gauss_arguments(
+        uniform(0.1, 4.0), uniform(0.1, 4.0), near_integer(0, 3, 1e-12, 1e-3), uniform(0.9, 1.0)), in_golden=False,
+        note="two solutions cancel, or stand for those at the integer")),
     positive_c(Region("d below 0", gauss_arguments(uniform(0.1, 5.0), uniform(0.1, 5.0), uniform(-5.0, 0.0),
                                                    uniform(-0.5, 0.999)))),
     Region("polynomial", every(integer(-8, 0), uniform(-5.0, 5.0), uniform(0.1, 10.0), uniform(-3.0, 3.0)),
