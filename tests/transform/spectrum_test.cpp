@@ -209,6 +209,17 @@ TYPED_TEST(MovingSums, CascadeIsARepeatedSumOverTheWindow) {
     }
 }
 
+TYPED_TEST(MovingSums, StagesOfACascadeRoundAsOneAfterTheOther) {
+    const std::vector<TypeParam> samples = Stream<TypeParam>::Random(50);
+    HostArray<TypeParam> expected(samples);
+    for (int32_t stages = 1; stages < 10; ++stages) {
+        ASSERT_EQ(this->Cascade(expected, 1, 7, 1), 0);
+        HostArray<TypeParam> x(samples);
+        ASSERT_EQ(this->Cascade(x, stages, 7, 1), 0);
+        EXPECT_EQ(x.values(), expected.values()) << stages << " stages";
+    }
+}
+
 TYPED_TEST(MovingSums, CascadeGoesOnFromBlockToBlock) {
     const std::vector<TypeParam> samples = Stream<TypeParam>::Random(200);
     HostArray<TypeParam> whole(samples);
