@@ -11,26 +11,26 @@
 namespace krnumer {
 namespace {
 
-// One column of a plane.
+// Neighbouring columns of a plane.
 template <class T>
-struct Column {
+struct Columns {
     using Value = T;
 
-    T Get(int32_t row) const { return data[row * stride]; }
-    void Set(int32_t row, T value) const { data[row * stride] = value; }
+    T Get(int32_t row, int32_t column) const { return data[row * stride + column]; }
+    void Set(int32_t row, int32_t column, T value) const { data[row * stride + column] = value; }
 
     T* data;
     ptrdiff_t stride;
 };
 
-// A complex column of rows in half-complex form: its parts are two columns.
-struct HalfComplexColumn {
+// Neighbouring complex columns of rows in half-complex form: their imaginary parts stand in the opposite order.
+struct HalfComplexColumns {
     using Value = Complex;
 
-    Complex Get(int32_t row) const { return {re[row * stride], im[row * stride]}; }
-    void Set(int32_t row, Complex value) const {
-        re[row * stride] = value.re;
-        im[row * stride] = value.im;
+    Complex Get(int32_t row, int32_t column) const { return {re[row * stride + column], im[row * stride - column]}; }
+    void Set(int32_t row, int32_t column, Complex value) const {
+        re[row * stride + column] = value.re;
+        im[row * stride - column] = value.im;
     }
 
     double* re;
@@ -38,34 +38,47 @@ struct HalfComplexColumn {
     ptrdiff_t stride;
 };
 
-// Convolves rows in the frequency domain along one column after the other, x in place.
+// Convolves rows in the frequency domain along columns, x in place.
 class ColumnConvolution {
   public:
+    static constexpr int32_t kTogether = 8;  // columns, so that lines of the cache are used whole
+
     ColumnConvolution(int32_t rx, int32_t ry)
-        : rx_(rx), ry_(ry), rows_(FullLength(rx, ry)), table_(rows_), work_(3 * Count(rows_)) {}
+        : rx_(rx), ry_(ry), rows_(FullLength(rx, ry)), table_(rows_), work_((2 * kTogether + 2) * Count(rows_)) {}
 
     explicit operator bool() const { return table_ && work_; }
 
-    template <class Line>
-    int32_t Run(Line x, Line y) {
-        using T = typename Line::Value;
-        T* a = reinterpret_cast<T*>(work_.data());
-        T* b = a + rows_;
-        T* c = b + rows_;
-        Gather(x, rx_, b);
-        if (const int32_t status = Forward(table_.get(), b, a, rows_)) return status;
-        Gather(y, ry_, b);
-        if (const int32_t status = Forward(table_.get(), b, c, rows_)) return status;
-        if (const int32_t status = InverseOfProduct(table_.get(), a, c, rows_, b, a, rows_)) return status;
-        for (int32_t r = 0; r < rows_; ++r) x.Set(r, a[r]);
+    // `count` columns, at most kTogether.
+    template <class Columns>
+    int32_t Run(Columns x, Columns y, int32_t count) {
+        using T = typename Columns::Value;
+        const ptrdiff_t length = rows_;
+        T* const x_lines = reinterpret_cast<T*>(work_.data());
+        T* const y_lines = x_lines + kTogether * length;
+        T* const a = y_lines + kTogether * length;
+        T* const b = a + length;
+        Gather(x, rx_, count, x_lines);
+        Gather(y, ry_, count, y_lines);
+        for (int32_t c = 0; c < count; ++c) {
+            T* const x_line = x_lines + c * length;
+            T* const y_line = y_lines + c * length;
+            if (const int32_t status = Forward(table_.get(), x_line, a, rows_)) return status;
+            if (const int32_t status = Forward(table_.get(), y_line, b, rows_)) return status;
+            if (const int32_t status = InverseOfProduct(table_.get(), a, b, rows_, y_line, x_line, rows_))
+                return status;
+        }
+        for (int32_t r = 0; r < rows_; ++r)
+            for (int32_t c = 0; c < count; ++c) x.Set(r, c, x_lines[c * length + r]);
         return kOk;
     }
 
   private:
-    template <class Line, class T>
-    void Gather(Line line, int32_t rows, T* out) const {
-        for (int32_t r = 0; r < rows; ++r) out[r] = line.Get(r);
-        std::fill(out + rows, out + rows_, T{});
+    template <class Columns, class T>
+    void Gather(Columns columns, int32_t rows, int32_t count, T* lines) const {
+        const ptrdiff_t length = rows_;
+        for (int32_t r = 0; r < rows; ++r)
+            for (int32_t c = 0; c < count; ++c) lines[c * length + r] = columns.Get(r, c);
+        for (int32_t c = 0; c < count; ++c) std::fill(lines + c * length + rows, lines + (c + 1) * length, T{});
     }
 
     int32_t rx_;
@@ -106,19 +119,22 @@ int32_t TransformRows(Plane<T> plane, const HeldTable& table, int32_t n, T* padd
 
 // A spectrum of n values in a row, as columns of its own kind.
 int32_t ConvolveColumns(ColumnConvolution& convolution, Complex* x, Complex* y, int32_t n) {
-    for (int32_t c = 0; c < n; ++c) {
-        const int32_t status = convolution.Run(Column<Complex>{x + c, n}, Column<Complex>{y + c, n});
-        if (status != kOk) return status;
+    int32_t status = kOk;
+    for (int32_t c = 0; c < n && status == kOk; c += convolution.kTogether) {
+        const int32_t count = std::min(n - c, convolution.kTogether);
+        status = convolution.Run(Columns<Complex>{x + c, n}, Columns<Complex>{y + c, n}, count);
     }
-    return kOk;
+    return status;
 }
 int32_t ConvolveColumns(ColumnConvolution& convolution, double* x, double* y, int32_t n) {
-    int32_t status = convolution.Run(Column<double>{x, n}, Column<double>{y, n});
-    for (int32_t c = 1; c <= (n - 1) / 2 && status == kOk; ++c) {
-        status = convolution.Run(HalfComplexColumn{x + c, x + (n - c), n}, HalfComplexColumn{y + c, y + (n - c), n});
+    int32_t status = convolution.Run(Columns<double>{x, n}, Columns<double>{y, n}, 1);
+    const int32_t half = (n - 1) / 2;
+    for (int32_t c = 1; c <= half && status == kOk; c += convolution.kTogether) {
+        status = convolution.Run(HalfComplexColumns{x + c, x + (n - c), n}, HalfComplexColumns{y + c, y + (n - c), n},
+                                 std::min(half - c + 1, convolution.kTogether));
     }
     if (n % 2 == 0 && status == kOk) {
-        status = convolution.Run(Column<double>{x + n / 2, n}, Column<double>{y + n / 2, n});
+        status = convolution.Run(Columns<double>{x + n / 2, n}, Columns<double>{y + n / 2, n}, 1);
     }
     return status;
 }
