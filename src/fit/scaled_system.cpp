@@ -42,7 +42,7 @@ class Triangle {
             if (!std::isfinite(reflector.image)) return false;
             if (reflector.h == 0.0) continue;
             std::transform(column, column + length, scaled, [&](double x) { return x / reflector.h; });
-            ReflectRows(column, scaled, column + stride_, k_ - j, length, stride_);
+            ReflectRows(column, scaled, Block<double>{column + stride_, k_ - j, length, stride_});
             column[0] = reflector.image;
         }
         return true;

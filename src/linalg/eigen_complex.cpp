@@ -41,10 +41,10 @@ void ReduceToHessenberg(const Reduction& r) {
         r.subdiagonal[m] = reflector.image;
         r.h[m] = reflector.h;
         if (reflector.h == 0.0) continue;
-        ReflectColumns(column, r.n, reflector.h, column + 1, size, r.n - m, r.n, r.sums);
+        ReflectColumns({column, r.n}, reflector.h, Block<Complex>{column + 1, size, r.n - m, r.n}, r.sums);
         for (std::ptrdiff_t k = 0; k < size; ++k) r.vector[k] = Conjugate(column[k * r.n]);
         for (std::ptrdiff_t k = 0; k < size; ++k) r.scaled[k] = r.vector[k] / reflector.h;
-        ReflectRows(r.vector, r.scaled, r.a + m, r.high + 1, size, r.n);
+        ReflectRows(r.vector, r.scaled, Block<Complex>{r.a + m, r.high + 1, size, r.n});
     }
     if (r.low < r.high) r.subdiagonal[r.high] = *r.Column(r.high);
 }
@@ -58,7 +58,7 @@ void Accumulate(const Reduction& r, Complex* columns) {
         const std::ptrdiff_t size = r.high - m + 1;
         for (std::ptrdiff_t k = 0; k < size; ++k) r.vector[k] = r.Column(m)[k * r.n];
         for (std::ptrdiff_t k = 0; k < size; ++k) r.scaled[k] = r.vector[k] / r.h[m];
-        ReflectRows(r.vector, r.scaled, columns + m * (r.n + 1), size, size, r.n);
+        ReflectRows(r.vector, r.scaled, Block<Complex>{columns + m * (r.n + 1), size, size, r.n});
     }
 }
 

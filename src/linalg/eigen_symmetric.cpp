@@ -106,7 +106,7 @@ template <class T>
 void Accumulate(const Tridiagonal<T>& t) {
     for (std::ptrdiff_t i = 0; i < t.n; ++i) {
         T* row = t.Row(i);
-        if (i > 1 && t.h[i] != 0.0) ReflectColumns(row, 1, t.h[i], t.a, i, i, t.n, t.row);
+        if (i > 1 && t.h[i] != 0.0) ReflectColumns({row, 1}, t.h[i], Block<T>{t.a, i, i, t.n}, t.row);
         std::fill_n(row, i, T{});
         row[i] = t.phase[i];
         for (std::ptrdiff_t k = 0; k < i; ++k) t.Row(k)[i] = T{};

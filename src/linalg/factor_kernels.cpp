@@ -1,7 +1,5 @@
 // Compiled once for every kind of vector unit that the machine may have. Tiles stay in registers while the terms go by;
-// the columns of a tile fill vectors. The units have fused products, which would round differently; none is used, so
-// every unit gives the same. That is also why complex arithmetic is written out in vectors here: where the compiler
-// finds it by itself, it fuses it.
+// the columns of a tile fill vectors.
 #include "linalg/factor_kernels.h"
 
 #include "linalg/element.h"
@@ -12,6 +10,8 @@
 #define HWY_TARGET_INCLUDE "linalg/factor_kernels.cpp"
 #include <hwy/foreach_target.h>
 #include <hwy/highway.h>
+
+#include "linalg/elements-inl.h"
 
 HWY_BEFORE_NAMESPACE();
 namespace krnumer::HWY_NAMESPACE {
@@ -55,50 +55,6 @@ void Solve(const DiagonalSquare<T>& square, T* const* rows, size_t count) {
 }
 
 #else
-
-// Elements in a vector. Real and imaginary parts of complex ones alternate.
-template <class D, class T>
-inline constexpr size_t kElements = hn::MaxLanes(D()) / (sizeof(T) / sizeof(double));
-
-template <class D, class T>
-HWY_INLINE hn::Vec<D> LoadElements(D d, const T* elements) {
-    return hn::LoadU(d, reinterpret_cast<const double*>(elements));
-}
-
-template <class D, class T>
-HWY_INLINE void StoreElements(hn::Vec<D> v, D d, T* elements) {
-    hn::StoreU(v, d, reinterpret_cast<double*>(elements));
-}
-
-// A vector of a row, ready to be multiplied by elements of another matrix, which may be conjugated.
-template <class D, class T>
-struct RowVector {
-    using V = hn::Vec<D>;
-
-    HWY_INLINE RowVector(D, V elements, bool) : row(elements) {}
-    HWY_INLINE V Times(D d, const T* a) const { return hn::Mul(hn::Set(d, *a), row); }
-
-    V row;
-};
-
-// a b = a.re (b.re, b.im) + a.im (-b.im, b.re), or with (b.im, -b.re) if a is conjugated.
-template <class D>
-struct RowVector<D, Complex> {
-    using V = hn::Vec<D>;
-
-    HWY_INLINE RowVector(D d, V elements, bool conjugate_a)
-        : row(elements), turned(hn::Xor(hn::Shuffle01(row), Signs(d, conjugate_a))) {}
-    HWY_INLINE V Times(D d, const Complex* a) const {
-        return hn::Add(hn::Mul(hn::Set(d, a->re), row), hn::Mul(hn::Set(d, a->im), turned));
-    }
-    static HWY_INLINE V Signs(D d, bool conjugate_a) {
-        alignas(16) static constexpr double kSigns[3] = {-0.0, 0.0, -0.0};
-        alignas(16) const double signs[2] = {kSigns[conjugate_a], kSigns[conjugate_a + 1]};
-        return hn::LoadDup128(d, signs);
-    }
-
-    V row, turned;
-};
 
 template <class D>
 HWY_INLINE hn::Vec<D> Quotient(D d, hn::Vec<D> x, double divisor) {
@@ -174,16 +130,6 @@ HWY_INLINE size_t SolveColumns(D d, const DiagonalSquare<T>& square, T* const* r
         }
     }
     return column;
-}
-
-// Calls columns(tag, column), which returns the first column that is left, for vectors of falling length.
-template <class T, class Columns>
-HWY_INLINE void ByFallingLength(size_t column, Columns columns) {
-    constexpr hn::ScalableTag<double> kFull;
-    column = columns(kFull, column);
-    if constexpr (hn::MaxLanes(kFull) > 4) column = columns(hn::CappedTag<double, 4>(), column);
-    if constexpr (hn::MaxLanes(kFull) > 2) column = columns(hn::CappedTag<double, 2>(), column);
-    if constexpr (!kIsComplex<T>) columns(hn::CappedTag<double, 1>(), column);
 }
 
 template <class T>

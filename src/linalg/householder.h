@@ -42,6 +42,13 @@ Reflector<T> MakeReflector(T* x, std::ptrdiff_t count, std::ptrdiff_t stride) {
     double scale = 0.0;
     for (std::ptrdiff_t k = 0; k < count; ++k) scale += SumOfParts(x[k * stride]);
     if (scale == 0.0) return {};
+    if (count == 1) {  // no more than a change of sign
+        const T image = -x[0];
+        x[0] = x[0] / scale;
+        const double h = -2.0 * SquaredModulus(x[0]);
+        x[0] = x[0] * 2.0;
+        return {image, h};
+    }
     double squares = 0.0;
     for (std::ptrdiff_t k = 0; k < count; ++k) {
         T& element = x[k * stride];
@@ -64,48 +71,54 @@ Reflector<T> MakeReflector(T* x, std::ptrdiff_t count, std::ptrdiff_t stride) {
     return {image * scale, h};
 }
 
-// block = (I + v v^H / h) block for the rows by columns block with rows `row_stride` apart. v is not part of it.
-// sums: work space for one row.
+// A block of a row-major matrix: its rows stand `stride` elements apart.
 template <class T>
-void ReflectColumns(const T* v, std::ptrdiff_t v_stride, double h, T* block, std::ptrdiff_t rows,
-                    std::ptrdiff_t columns, std::ptrdiff_t row_stride, T* sums) {
-    for (std::ptrdiff_t j = 0; j < columns; ++j) sums[j] = T{};
-    for (std::ptrdiff_t k = 0; k < rows; ++k) {
-        const T factor = Conjugate(v[k * v_stride]);
-        const T* row = block + k * row_stride;
-        for (std::ptrdiff_t j = 0; j < columns; ++j) sums[j] += factor * row[j];
-    }
-    for (std::ptrdiff_t j = 0; j < columns; ++j) sums[j] = sums[j] / h;
-    for (std::ptrdiff_t k = 0; k < rows; ++k) {
-        const T factor = v[k * v_stride];
-        T* row = block + k * row_stride;
-        for (std::ptrdiff_t j = 0; j < columns; ++j) row[j] += factor * sums[j];
-    }
+struct Block {
+    T* elements;
+    std::ptrdiff_t rows, columns, stride;
+
+    T* Row(std::ptrdiff_t i) const { return elements + i * stride; }
+};
+
+// The elements of a vector, `stride` apart.
+template <class T>
+struct Spaced {
+    const T* elements;
+    std::ptrdiff_t stride;
+
+    const T& operator[](std::ptrdiff_t i) const { return elements[i * stride]; }
+};
+
+// Each sum below is taken in the order of its terms, and no product is fused, so vector units make no difference.
+
+// sums = v^H block.
+template <class T>
+void SumColumns(Spaced<T> v, const Block<T>& block, T* sums);
+
+// block += v sums.
+template <class T>
+void AddProducts(Spaced<T> v, const T* sums, const Block<T>& block);
+
+// block = block (I + r^H r / h) for a row vector r, given with scaled = r / h.
+template <class T>
+void ReflectRows(const T* r, const T* scaled, const Block<T>& block);
+
+// AddProducts, then ReflectRows, a few rows at a time.
+template <class T>
+void AddProductsAndReflectRows(Spaced<T> v, const T* sums, const T* r, const T* scaled, const Block<T>& block);
+
+// The row that (I + v v^H / h) adds to the rows of a block, once for each element of v: v^H block / h.
+template <class T>
+void FindReflection(Spaced<T> v, double h, const Block<T>& block, T* sums) {
+    SumColumns(v, block, sums);
+    for (std::ptrdiff_t j = 0; j < block.columns; ++j) sums[j] = sums[j] / h;
 }
 
-// block = block (I + r^H r / h) for a row vector r, given with scaled = r / h. Several rows at once, because each sum
-// of products is a chain of additions.
-template <int rows, class T>
-void ReflectRowGroup(const T* r, const T* scaled, T* block, std::ptrdiff_t columns, std::ptrdiff_t row_stride) {
-    T sums[rows] = {};
-    for (std::ptrdiff_t k = 0; k < columns; ++k) {
-        const T factor = Conjugate(r[k]);
-        for (int j = 0; j < rows; ++j) sums[j] += block[j * row_stride + k] * factor;
-    }
-    for (int j = 0; j < rows; ++j) {
-        T* row = block + j * row_stride;
-        for (std::ptrdiff_t k = 0; k < columns; ++k) row[k] += sums[j] * scaled[k];
-    }
-}
-
+// block = (I + v v^H / h) block. v is not part of it. sums: work space for one row.
 template <class T>
-void ReflectRows(const T* r, const T* scaled, T* block, std::ptrdiff_t rows, std::ptrdiff_t columns,
-                 std::ptrdiff_t row_stride) {
-    constexpr int kGroup = 8;
-    std::ptrdiff_t j = 0;
-    for (; j + kGroup <= rows; j += kGroup)
-        ReflectRowGroup<kGroup>(r, scaled, block + j * row_stride, columns, row_stride);
-    for (; j < rows; ++j) ReflectRowGroup<1>(r, scaled, block + j * row_stride, columns, row_stride);
+void ReflectColumns(Spaced<T> v, double h, const Block<T>& block, T* sums) {
+    FindReflection(v, h, block, sums);
+    AddProducts(v, sums, block);
 }
 
 }  // namespace krnumer

@@ -30,7 +30,8 @@ struct Reduction {
     double* right_h;        // of G1 ... Gn-1
     T* left_phase;          // P
     T* right_phase;         // Q
-    T* row;                 // work space
+    T* sums;                // work space for a row
+    T* scaled;              // and another
 
     T* At(std::ptrdiff_t i, std::ptrdiff_t j) const { return a + i * n + j; }
 };
@@ -46,17 +47,29 @@ void Bidiagonalise(const Reduction<T>& r) {
         T* row = column + 1;
 
         const Reflector<T> left = MakeReflector(column, below, r.n);
-        if (left.h != 0.0) ReflectColumns(column, r.n, left.h, row, below, rest, r.n, r.row);
         r.left_h[i] = left.h;
         r.right_phase[i] = phase;
         r.diagonal[i] = RealImage(left.image, &phase);
         r.left_phase[i] = phase;
         if (rest == 0) break;
 
+        // The first row alone tells the right reflector, so the other rows meet both at once.
+        const Spaced<T> v{column, r.n}, v_below{column + r.n, r.n};
+        const Block<T> others{row + r.n, below - 1, rest, r.n};
+        if (left.h != 0.0) {
+            FindReflection(v, left.h, {row, below, rest, r.n}, r.sums);
+            AddProducts(v, r.sums, {row, 1, rest, r.n});
+        }
         const Reflector<T> right = MakeReflector(row, rest, 1);
-        if (right.h != 0.0) {
-            for (std::ptrdiff_t k = 0; k < rest; ++k) r.row[k] = row[k] / right.h;
-            ReflectRows(row, r.row, row + r.n, below - 1, rest, r.n);
+        if (right.h == 0.0) {
+            if (left.h != 0.0) AddProducts(v_below, r.sums, others);
+        } else {
+            std::transform(row, row + rest, r.scaled, [&right](T x) { return x / right.h; });
+            if (left.h != 0.0) {
+                AddProductsAndReflectRows(v_below, r.sums, row, r.scaled, others);
+            } else {
+                ReflectRows(row, r.scaled, others);
+            }
         }
         r.right_h[i] = right.h;
         r.superdiagonal[i + 1] = RealImage(Conjugate(right.image), &phase);
@@ -75,7 +88,7 @@ void AccumulateRight(const Reduction<T>& r, T* v) {
         const std::ptrdiff_t rest = n - i - 1;
         T* reflector = r.At(i, i + 1);
         std::transform(reflector, reflector + rest, reflector, [](T x) { return Conjugate(x); });
-        ReflectColumns(reflector, 1, r.right_h[i], v + (i + 1) * (n + 1), rest, rest, n, r.row);
+        ReflectColumns({reflector, 1}, r.right_h[i], Block<T>{v + (i + 1) * (n + 1), rest, rest, n}, r.sums);
     }
 }
 
@@ -89,7 +102,7 @@ void AccumulateLeft(const Reduction<T>& r) {
         T* column = r.At(i, i);
         std::fill_n(column + 1, rest, T{});
         if (h != 0.0) {
-            ReflectColumns(column, r.n, h, column + 1, below, rest, r.n, r.row);
+            ReflectColumns({column, r.n}, h, Block<T>{column + 1, below, rest, r.n}, r.sums);
             const T factor = Conjugate(*column) * r.left_phase[i] / h;
             for (std::ptrdiff_t k = 0; k < below; ++k) column[k * r.n] = column[k * r.n] * factor;
         }
@@ -114,7 +127,7 @@ template <class T>
 int32_t DecomposeTall(T* a, int32_t rows, int32_t columns, double* s, T* v) {
     const std::ptrdiff_t m = rows, n = columns;
     const bool vectors = v != nullptr;
-    Workspace<T> work(3 * n + (vectors ? (m + n) * n : 0), 3 * n + (vectors ? 5 * n : 0));
+    Workspace<T> work(4 * n + (vectors ? (m + n) * n : 0), 3 * n + (vectors ? 5 * n : 0));
     if (!work) return kOutOfMemory;
 
     const Reduction<T> reduction{.a = a,
@@ -126,7 +139,8 @@ int32_t DecomposeTall(T* a, int32_t rows, int32_t columns, double* s, T* v) {
                                  .right_h = work.Doubles(n),
                                  .left_phase = work.Elements(n),
                                  .right_phase = work.Elements(n),
-                                 .row = work.Elements(n)};
+                                 .sums = work.Elements(n),
+                                 .scaled = work.Elements(n)};
     const Bidiagonal bidiagonal{n, s, reduction.superdiagonal};
     Bidiagonalise(reduction);
     if (!vectors) {
