@@ -7,8 +7,7 @@ using namespace krnumer;
 
 namespace {
 
-// A record of the caller's, packed and at any address, as the core's own record for the time of the core; core(state)
-// gets it together with what it needs of the others.
+// The caller's record, packed and at any address, as the core's own for as long as the core runs.
 class State {
   public:
     explicit State(KrRandomState* record) : record_(record), state_{record->s1, record->s2, record->s3} {}
