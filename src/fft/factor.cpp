@@ -29,7 +29,7 @@ int32_t RunRealStage(const qmfft_table* table, int32_t i, double* data, int32_t 
     const stage_tables& stage = *table->stages[i];
     switch (table->kinds[i]) {
         case kButterfly:
-            if (stride == 1 && table->vectors[i] != nullptr && i >= table->tiledReal) {
+            if (stride == 1 && table->vectors[i] != nullptr && !RunsInTiles<double>(table, i)) {
                 table->realLeaf[i](data, data, m, m, 1);  // row 0
                 const int32_t k = table->vectors[i]->real.stage(data, stage.packedReal, m);
                 if (2 * k <= m) ButterfliesOf(r)->real_rows(data, stage.twiddleRe, stage.twiddleIm, m, k, m);
@@ -65,7 +65,7 @@ int32_t RunComplexStage(const qmfft_table* table, int32_t i, double* re, double*
     const stage_tables& stage = *table->stages[i];
     switch (table->kinds[i]) {
         case kButterfly:
-            if (im == re + 1 && stride == 2 && table->vectors[i] != nullptr && i >= table->tiledComplex) {
+            if (im == re + 1 && stride == 2 && table->vectors[i] != nullptr && !RunsInTiles<Complex>(table, i)) {
                 table->vectors[i]->complex.stage(reinterpret_cast<Complex*>(re), m, stage.packedComplex, m, true);
             } else {
                 table->cplxStage[i](re, im, stage.twiddleRe, stage.twiddleIm, stride, m);

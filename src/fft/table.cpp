@@ -8,7 +8,6 @@
 #include <type_traits>
 
 #include "fft/rader.h"
-#include "fft/vector_tiles.h"
 #include "fft/vector_transform.h"
 #include "frame/numeric.h"
 
@@ -129,8 +128,7 @@ bool BuildStages(qmfft_table* table) {
         table->stages[i] = static_cast<stage_tables*>(std::calloc(1, sizeof(stage_tables)));
         if (table->stages[i] == nullptr) return false;
     }
-    table->tiledComplex = CountTiledFactors<Complex>(table);
-    table->tiledReal = CountTiledFactors<double>(table);
+    if (!MakePlan<Complex>(table, &table->complexPlan) || !MakePlan<double>(table, &table->realPlan)) return false;
     int32_t m = table->length;
     for (int32_t i = 0; i < table->factorCount - 1; ++i) {
         m /= table->factors[i];
@@ -160,6 +158,8 @@ void FreeStages(qmfft_table* table) {
         std::free(stage->raderOut);
         std::free(stage);
     }
+    std::free(table->complexPlan.places);
+    std::free(table->realPlan.places);
 }
 
 // ---- List ----

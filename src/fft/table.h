@@ -1,10 +1,13 @@
 // Tables of the Fourier transform: how a length is factored, which butterflies run it, and its trigonometric values.
 #pragma once
 
+#include <cstddef>
 #include <cstdint>
+#include <type_traits>
 
 #include "fft/fft.h"
 #include "fft/vector_kernels.h"
+#include "frame/complex.h"
 
 namespace krnumer {
 
@@ -58,6 +61,17 @@ struct stage_tables {
     double* packedReal;
 };
 
+// How the factors are gone through on adjacent elements: the first `depth` of them leave sub-sequences, which are
+// transformed some at a time, and their own stages follow.
+struct VectorPlan {
+    int32_t depth;
+    int32_t sequences;  // how many sub-sequences there are; 0 in an empty plan
+    int32_t length;     // of each
+    int32_t together;   // how many are transformed at a time
+    bool tiled;         // whether the stages are run in tiles
+    ptrdiff_t* places;  // where the results of the sub-sequences begin, in the order of their first samples
+};
+
 }  // namespace krnumer
 
 // The table of one length. Immutable while it is linked, but for its count and its links.
@@ -75,11 +89,23 @@ struct qmfft_table {
     qmfft_table* prev;
     qmfft_table* next;
     const krnumer::VectorButterflies* vectors[krnumer::kMaxFactors];  // null where there are none
-    int32_t tiledComplex;  // how many of the first factors have their stages run in tiles
-    int32_t tiledReal;
+    krnumer::VectorPlan complexPlan;
+    krnumer::VectorPlan realPlan;
 };
 
 namespace krnumer {
+
+// The plan for elements T, Complex or double.
+template <class T>
+const VectorPlan& PlanOf(const qmfft_table* table) {
+    if constexpr (std::is_same_v<T, Complex>) return table->complexPlan;
+    if constexpr (std::is_same_v<T, double>) return table->realPlan;
+}
+
+template <class T>
+bool RunsInTiles(const qmfft_table* table, int32_t i) {
+    return PlanOf<T>(table).tiled && i < PlanOf<T>(table).depth;
+}
 
 // Steps of creation and release that expect the table lock to be held. BuildTable finds or makes a held table; null
 // for a length below 1 or without memory, and then nothing is left behind.

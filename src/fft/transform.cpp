@@ -75,7 +75,8 @@ int32_t ComplexFFT(const qmfft_table* table, const double* in_re, const double* 
         *out_im = *in_im;
         return kOk;
     }
-    if (HasVectorLeaf(table) && in_im == in_re + 1 && in_stride == 2 && out_im == out_re + 1 && out_stride == 2)
+    if (table->complexPlan.sequences > 0 && in_im == in_re + 1 && in_stride == 2 && out_im == out_re + 1 &&
+        out_stride == 2)
         return VectorComplexFFT(table, in_re, out_re);
     if (table->factorCount == 1)
         return RunComplexLeaf(table, 0, in_re, in_im, out_re, out_im, in_stride, out_stride, 1);
@@ -89,7 +90,7 @@ int32_t RealFFT(const qmfft_table* table, const double* in, double* out, int32_t
         *out = *in;
         return kOk;
     }
-    if (HasVectorLeaf(table) && in_stride == 1 && out_stride == 1) return VectorRealFFT(table, in, out);
+    if (table->realPlan.sequences > 0 && in_stride == 1 && out_stride == 1) return VectorRealFFT(table, in, out);
     if (table->factorCount == 1) return RunRealLeaf(table, 0, in, out, in_stride, out_stride, 1);
     return RealFFTStep(n, table, 0, in, out, in_stride, out_stride);
 }

@@ -72,10 +72,10 @@ Pass MakePass(const qmfft_table* table, int32_t end, int32_t m) {
 
 // The passes of a table, in the order in which they run: run(pass).
 template <class T, class Run>
-void ForEachPass(const qmfft_table* table, int32_t tiled, Run run) {
-    int32_t m = table->length;
-    for (int32_t i = 0; i < tiled; ++i) m /= table->factors[i];
-    for (int32_t end = tiled; end > 0;) {
+void ForEachPass(const qmfft_table* table, Run run) {
+    const VectorPlan& plan = PlanOf<T>(table);
+    int32_t m = plan.length;
+    for (int32_t end = plan.depth; end > 0;) {
         const Pass pass = MakePass<T>(table, end, m);
         run(pass);
         end = pass.first;
@@ -224,7 +224,7 @@ int32_t LanesBeforeTiles(int32_t length) {
 
 template <class T>
 void CombineInTiles(const qmfft_table* table, T* data) {
-    ForEachPass<T>(table, TiledFactors<T>(table), [&](const Pass& pass) {
+    ForEachPass<T>(table, [&](const Pass& pass) {
         const ptrdiff_t block = ptrdiff_t{pass.rows} * pass.m;
         for (ptrdiff_t start = 0; start < table->length; start += block) {
             RunTiles(table, pass, data + start);
@@ -236,7 +236,7 @@ void CombineInTiles(const qmfft_table* table, T* data) {
 template <class T>
 size_t PackedCountInTiles(const qmfft_table* table, int32_t i) {
     size_t count = 0;
-    ForEachPass<T>(table, TiledFactors<T>(table), [&](const Pass& pass) {
+    ForEachPass<T>(table, [&](const Pass& pass) {
         if (i < pass.first || i >= pass.end) return;
         count = PackedCount<T>(pass.columns, table->factors[i]) * Count(RowsBehind(table, pass, i));
     });
@@ -245,7 +245,7 @@ size_t PackedCountInTiles(const qmfft_table* table, int32_t i) {
 
 template <class T>
 void PackTwiddlesInTiles(const qmfft_table* table, int32_t i, double* packed) {
-    ForEachPass<T>(table, TiledFactors<T>(table), [&](const Pass& pass) {
+    ForEachPass<T>(table, [&](const Pass& pass) {
         if (i < pass.first || i >= pass.end) return;
         const int32_t rows = RowsBehind(table, pass, i);
         for (int32_t start = 0; start < pass.columns; start += pass.width) {

@@ -5,10 +5,8 @@
 
 #include <cstddef>
 #include <cstdint>
-#include <type_traits>
 
 #include "fft/table.h"
-#include "frame/complex.h"
 
 namespace krnumer {
 
@@ -16,11 +14,6 @@ namespace krnumer {
 // and kernels must stand; 0 where the data stay in the cache anyway or a factor lacks vector kernels.
 template <class T>
 int32_t CountTiledFactors(const qmfft_table* table);
-
-template <class T>
-int32_t TiledFactors(const qmfft_table* table) {
-    return std::is_same_v<T, Complex> ? table->tiledComplex : table->tiledReal;
-}
 
 // How many neighbouring sub-sequences of `length` elements are transformed together before: as many as the cache holds.
 template <class T>

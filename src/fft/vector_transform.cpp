@@ -1,6 +1,7 @@
 #include "fft/vector_transform.h"
 
 #include <algorithm>
+#include <cstdlib>
 #include <type_traits>
 
 #include "fft/factor.h"
@@ -18,8 +19,6 @@ namespace {
 // far apart the samples of one column are.
 template <class T>
 constexpr int32_t kGroup = 64 / sizeof(T);
-
-constexpr int32_t kMostTogether = 32;
 
 // Data up to this size stay in the second-level cache between the passes, and no pass needs to be cut into blocks.
 constexpr size_t kCachedBytes = 512 * 1024;
@@ -43,37 +42,6 @@ int32_t RunStage(const qmfft_table* table, int32_t i, double* data, int32_t m) {
     return RunRealStage(table, i, data, 1, m);
 }
 
-// Where the sub-sequences of the first `depth` factors have their results, in the order of their first samples.
-class Places {
-  public:
-    Places(const qmfft_table* table, int32_t depth) : table_(table) {
-        int32_t length = table->length;
-        for (int32_t i = 0; i < depth; ++i) {
-            length /= table->factors[i];
-            step_[i] = length;
-            digit_[i] = 0;
-        }
-        step_[depth] = 0;
-        digit_[depth] = 0;
-    }
-
-    ptrdiff_t Next() {
-        const ptrdiff_t place = place_;
-        place_ += step_[0];
-        for (int32_t i = 0; ++digit_[i] == table_->factors[i]; ++i) {
-            digit_[i] = 0;
-            place_ += step_[i + 1] - step_[i] * table_->factors[i];
-        }
-        return place;
-    }
-
-  private:
-    const qmfft_table* table_;
-    ptrdiff_t place_ = 0;
-    ptrdiff_t step_[kMaxFactors + 1];
-    int32_t digit_[kMaxFactors + 1];
-};
-
 // Fetches samples that are far apart before they are read.
 template <class T>
 void PrefetchLanes(const T* in, ptrdiff_t step, int32_t count, int32_t lanes) {
@@ -91,7 +59,7 @@ int32_t TransformLanes(const qmfft_table* table, int32_t i, int32_t n, const T* 
         return kOk;
     }
     const int32_t m = n / r;
-    const bool far_apart = i == table->factorCount - 2 && TiledFactors<T>(table) > 0;
+    const bool far_apart = i == table->factorCount - 2 && PlanOf<T>(table).tiled;
     for (int32_t b = 0; b < r; ++b) {
         if (far_apart && b + 1 < r) PrefetchLanes(in + (b + 1) * step, r * step, m, lanes);
         if (const int32_t status =
@@ -104,45 +72,29 @@ int32_t TransformLanes(const qmfft_table* table, int32_t i, int32_t n, const T* 
     return kOk;
 }
 
-// The first `depth` factors are gone through in passes over all data, those behind them depth first.
+// The stages behind the plan's sub-sequences go through all data one after the other, or in tiles.
 template <class T>
-int32_t Transform(const qmfft_table* table, const T* in, T* out) {
-    const int32_t n = table->length;
-    const int32_t last = table->factorCount - 1;
-    if (last == 0) {
-        const ptrdiff_t place = 0;
-        RunColumns(table, 0, in, 1, out, &place, 1);
+int32_t Transform(const qmfft_table* table, const VectorPlan& plan, const T* in, T* out) {
+    if (plan.depth == 0) {
+        RunColumns(table, 0, in, 1, out, plan.places, 1);
         return kOk;
     }
-    const bool cached = Count(n) * sizeof(T) <= kCachedBytes;
-    const int32_t tiled = TiledFactors<T>(table);
-    int32_t depth = 0;
-    int32_t sequences = 1;
-    while (depth < last && (tiled > 0 ? depth < tiled : cached || sequences < kGroup<T>))
-        sequences *= table->factors[depth++];
-
-    const int32_t together = tiled > 0 ? std::min(LanesBeforeTiles<T>(n / sequences), kMostTogether)
-                             : cached  ? kMostTogether
-                                       : kGroup<T>;
-    Places next(table, depth);
-    for (int32_t start = 0; start < sequences; start += together) {
-        const int32_t lanes = std::min(together, sequences - start);
-        ptrdiff_t places[kMostTogether];
-        for (int32_t l = 0; l < lanes; ++l) places[l] = next.Next();
-        if (const int32_t status =
-                TransformLanes(table, depth, n / sequences, in + start, sequences, out, places, lanes)) {
+    for (int32_t start = 0; start < plan.sequences; start += plan.together) {
+        const int32_t lanes = std::min(plan.together, plan.sequences - start);
+        if (const int32_t status = TransformLanes(table, plan.depth, plan.length, in + start, plan.sequences, out,
+                                                  plan.places + start, lanes)) {
             return status;
         }
     }
-    if (tiled > 0) {
+    if (plan.tiled) {
         CombineInTiles(table, out);
         return kOk;
     }
-    int32_t length = n / sequences;
-    for (int32_t i = depth; i-- > 0;) {
+    int32_t length = plan.length;
+    for (int32_t i = plan.depth; i-- > 0;) {
         const int32_t m = length;
         length *= table->factors[i];
-        for (int32_t start = 0; start < n; start += length)
+        for (int32_t start = 0; start < table->length; start += length)
             if (const int32_t status = RunStage(table, i, out + start, m)) return status;
     }
     return kOk;
@@ -160,27 +112,52 @@ int32_t LastRow(int32_t m) {
 
 }  // namespace
 
-bool HasVectorLeaf(const qmfft_table* table) {
-    return table->vectors[table->factorCount - 1] != nullptr;
+template <class T>
+bool MakePlan(const qmfft_table* table, VectorPlan* plan) {
+    const int32_t last = table->factorCount - 1;
+    if (last < 0 || table->vectors[last] == nullptr) return true;
+    const bool cached = Count(table->length) * sizeof(T) <= kCachedBytes;
+    const int32_t tiled = CountTiledFactors<T>(table);
+    plan->tiled = tiled > 0;
+    plan->length = table->length;
+    plan->sequences = 1;
+    while (plan->depth < last && (tiled > 0 ? plan->depth < tiled : cached || plan->sequences < kGroup<T>)) {
+        plan->sequences *= table->factors[plan->depth];
+        plan->length /= table->factors[plan->depth++];
+    }
+    plan->together = tiled > 0 ? LanesBeforeTiles<T>(plan->length) : cached ? plan->sequences : kGroup<T>;
+
+    plan->places = static_cast<ptrdiff_t*>(std::malloc(Count(plan->sequences) * sizeof(ptrdiff_t)));
+    if (plan->places == nullptr) return false;
+    plan->places[0] = 0;
+    ptrdiff_t known = 1;
+    ptrdiff_t block = table->length;
+    for (int32_t i = 0; i < plan->depth; ++i) {
+        block /= table->factors[i];
+        for (ptrdiff_t b = 1; b < table->factors[i]; ++b)
+            for (ptrdiff_t s = 0; s < known; ++s) plan->places[b * known + s] = b * block + plan->places[s];
+        known *= table->factors[i];
+    }
+    return true;
 }
 
 int32_t VectorComplexFFT(const qmfft_table* table, const double* in, double* out) {
-    return Transform(table, reinterpret_cast<const Complex*>(in), reinterpret_cast<Complex*>(out));
+    return Transform(table, table->complexPlan, reinterpret_cast<const Complex*>(in), reinterpret_cast<Complex*>(out));
 }
 
 int32_t VectorRealFFT(const qmfft_table* table, const double* in, double* out) {
-    return Transform(table, in, out);
+    return Transform(table, table->realPlan, in, out);
 }
 
 template <class T>
 size_t CountStageTwiddles(const qmfft_table* table, int32_t i, int32_t m) {
-    if (i < TiledFactors<T>(table)) return PackedCountInTiles<T>(table, i);
+    if (RunsInTiles<T>(table, i)) return PackedCountInTiles<T>(table, i);
     return PackedCount<T>(LastRow<T>(m) + 1 - kFirstRow<T>, table->factors[i]);
 }
 
 template <class T>
 void PackStageTwiddles(const qmfft_table* table, int32_t i, int32_t m, double* packed) {
-    if (i < TiledFactors<T>(table)) {
+    if (RunsInTiles<T>(table, i)) {
         PackTwiddlesInTiles<T>(table, i, packed);
     } else {
         const auto row = [](int32_t k) { return k; };
@@ -188,6 +165,8 @@ void PackStageTwiddles(const qmfft_table* table, int32_t i, int32_t m, double* p
     }
 }
 
+template bool MakePlan<Complex>(const qmfft_table*, VectorPlan*);
+template bool MakePlan<double>(const qmfft_table*, VectorPlan*);
 template size_t CountStageTwiddles<Complex>(const qmfft_table*, int32_t, int32_t);
 template size_t CountStageTwiddles<double>(const qmfft_table*, int32_t, int32_t);
 template void PackStageTwiddles<Complex>(const qmfft_table*, int32_t, int32_t, double*);
