@@ -69,7 +69,7 @@ int32_t TransformRow(const qmfft_table* table, const Complex* in, int32_t shift,
 }
 
 int32_t TransformRow(const qmfft_table* table, const double* in, int32_t shift, Complex* out, int32_t n) {
-    if (const int32_t status = RealFFT(table, in, &out->re, 1, 2, n)) return status;
+    if (const int32_t status = RealFFT(table, in, HalfComplexPart(out, n), 1, 1, n)) return status;
     ExpandHalfComplex(out, n, shift);
     return kOk;
 }

@@ -97,7 +97,8 @@ int32_t ReQMFFTH80(KrHandle x, KrHandle y, void** slot, int32_t offset, int32_t 
             in = std::copy_n(in, available, padded.data()) - available;
         }
         Complex* out = spectrum.data();
-        if (const int32_t status = RealFFT(SlotTable(slot), in, &out->re, 1, 2, fft_size)) return status;
+        double* half_complex = HalfComplexPart(out, fft_size);
+        if (const int32_t status = RealFFT(SlotTable(slot), in, half_complex, 1, 1, fft_size)) return status;
         ExpandHalfComplex(out, fft_size, shift);
         return kOk;
     });

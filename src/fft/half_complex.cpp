@@ -5,16 +5,14 @@
 
 namespace krnumer {
 
+// The lower half of the spectrum overtakes none of the values that it is made of, and the upper half mirrors it.
 void ExpandHalfComplex(Complex* data, int32_t n, int32_t shift) {
+    const double* half_complex = HalfComplexPart(data, n);
     const int32_t half = (n - 1) / 2;
-    data[0].im = 0.0;
-    for (int32_t k = 1; k <= half; ++k) {
-        const double re = data[k].re;
-        const double im = data[n - k].re;
-        data[k] = {re, im};
-        data[n - k] = {re, -im};
-    }
-    if (n % 2 == 0) data[n / 2].im = 0.0;
+    data[0] = {half_complex[0], 0.0};
+    for (int32_t k = 1; k <= half; ++k) data[k] = {half_complex[k], half_complex[n - k]};
+    if (n % 2 == 0) data[n / 2] = {half_complex[n / 2], 0.0};
+    for (int32_t k = 1; k <= half; ++k) data[n - k] = {data[k].re, -data[k].im};
     if (shift != 0) ShiftSpectrum(data, n);
 }
 

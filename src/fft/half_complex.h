@@ -9,7 +9,12 @@
 
 namespace krnumer {
 
-// Half-complex values in the real parts of `data` become the full spectrum, in place.
+// Where ExpandHalfComplex expects the half-complex values: they are the last n of the 2n doubles.
+inline double* HalfComplexPart(Complex* data, int32_t n) {
+    return &data->re + n;
+}
+
+// Half-complex values become the full spectrum, in place.
 void ExpandHalfComplex(Complex* data, int32_t n, int32_t shift);
 
 // The half-complex form of a spectrum whose values stand `stride` complex numbers apart. One half is read, and of X[0]

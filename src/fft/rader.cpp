@@ -77,7 +77,8 @@ int32_t RaderReal(int32_t r, const double* in, double* out, const stage_tables& 
         total += samples[k - 1];
     }
     out[0] = total;
-    if (const int32_t status = RealFFT(tables.raderTable, samples, &spectrum->re, 1, 2, r - 1)) return status;
+    double* half_complex = HalfComplexPart(spectrum, r - 1);
+    if (const int32_t status = RealFFT(tables.raderTable, samples, half_complex, 1, 1, r - 1)) return status;
     ExpandHalfComplex(spectrum, r - 1, 0);
     MultiplyByKernel(tables, &spectrum->re, &spectrum->im, 2, r - 1);
     if (const int32_t status =

@@ -3,6 +3,7 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <limits>
 #include <vector>
 
@@ -14,15 +15,11 @@ namespace {
 
 constexpr double kNone = std::numeric_limits<double>::quiet_NaN();
 
-std::vector<Complex> InRealSlots(const std::vector<double>& half_complex) {
-    std::vector<Complex> data;
-    for (double value : half_complex) data.push_back({value, kNone});
-    return data;
-}
-
 std::vector<Complex> Expand(const std::vector<double>& half_complex, int32_t shift) {
-    std::vector<Complex> data = InRealSlots(half_complex);
-    ExpandHalfComplex(data.data(), static_cast<int32_t>(data.size()), shift);
+    const auto n = static_cast<int32_t>(half_complex.size());
+    std::vector<Complex> data(half_complex.size(), {kNone, kNone});
+    std::copy(half_complex.begin(), half_complex.end(), HalfComplexPart(data.data(), n));
+    ExpandHalfComplex(data.data(), n, shift);
     return data;
 }
 
