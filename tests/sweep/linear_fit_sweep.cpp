@@ -9,11 +9,18 @@ const std::vector<double> kY{1, 3, 2, 5, 7, 6};
 const std::vector<double> kW{1, 2, 1, 1, 2, 1};
 const std::vector<double> kH{1, 0, 1, 1, 1, 2, 1, 3, 1, 4, 1, 5};
 
+// The data again and again, `copies` times.
+std::vector<double> Repeat(const std::vector<double>& values, int32_t copies) {
+    std::vector<double> all;
+    for (int32_t i = 0; i < copies; ++i) all.insert(all.end(), values.begin(), values.end());
+    return all;
+}
+
 template <class Fit>
-int32_t PlayGeneral(sweep::Scene& scene, Fit fit, int32_t method) {
-    const KrHandle h = scene.Matrix(6, 2, kH);
-    const KrHandle y = scene.Doubles(kY);
-    const KrHandle w = scene.Doubles(kW);
+int32_t PlayGeneral(sweep::Scene& scene, Fit fit, int32_t method, int32_t copies = 1) {
+    const KrHandle h = scene.Matrix(6 * copies, 2, Repeat(kH, copies));
+    const KrHandle y = scene.Doubles(Repeat(kY, copies));
+    const KrHandle w = scene.Doubles(Repeat(kW, copies));
     const KrHandle coef = scene.OutDoubles();
     const KrHandle best_fit = scene.OutDoubles();
     const KrHandle covariance = scene.OutMatrix();
@@ -90,6 +97,12 @@ SWEEP_MORE(GenLSFit_head, qr) {
 }
 SWEEP_MORE(GenLSFit_head, cholesky) {
     return PlayGeneral(scene, GenLSFit_head, 5);
+}
+SWEEP_MORE(GenLSFit_head, many_rows) {
+    return PlayGeneral(scene, GenLSFit_head, 0, 600);
+}
+SWEEP_MORE(GenLSFit_head, qr_of_many_rows) {
+    return PlayGeneral(scene, GenLSFit_head, 1, 600);
 }
 SWEEP(GenLSFit80_head) {
     return PlayGeneral(scene, GenLSFit80_head, 4);
