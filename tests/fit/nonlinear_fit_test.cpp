@@ -149,6 +149,25 @@ TEST_F(CurveFits, IteratedFitsAreThoseOfLeastSquares) {
     }
 }
 
+TEST_F(CurveFits, MakeTheStepsOfTheirRules) {
+    const std::pair<Curve, std::string> curves[] = {
+        {Curve::kExponential, "exponential"}, {Curve::kPower, "power"}, {Curve::kGaussian, "gaussian"}};
+    for (const auto& [curve, name] : curves) {
+        for (const bool weighted : {false, true}) {
+            for (const Loop& loop : Loops("plain." + name + (weighted ? ".weighted" : ""))) {
+                SCOPED_TRACE(testing::Message() << name << ", tolerance " << loop.tol << ", budget " << loop.budget);
+                Fit fit = OfReference(name, weighted);
+                fit.tol = loop.tol;
+                fit.iter = loop.budget;
+                ASSERT_EQ(fit.Run(curve), 0);
+                EXPECT_EQ(fit.iter, loop.steps);
+                for (size_t j = 0; j < loop.coef.size(); ++j) EXPECT_THAT(fit.coef[j], Near(loop.coef[j], 1e-8));
+                EXPECT_THAT(fit.mse, Near(loop.error, 1e-8));
+            }
+        }
+    }
+}
+
 TEST_F(CurveFits, LogarithmsToAnyBaseAreOneCurve) {
     for (const bool weighted : {false, true}) {
         const std::string row = weighted ? "log.weighted" : "log";

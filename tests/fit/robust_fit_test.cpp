@@ -257,6 +257,27 @@ TEST_F(RobustFits, CoefficientsAloneLeaveTheRest) {
     }
 }
 
+TEST_F(RobustFits, MakeThePassesOfTheirRules) {
+    for (const Way way : kWays) {
+        for (const Model model : kModels) {
+            for (const bool weighted : {false, true}) {
+                const std::string name = NameOf(model) + (weighted ? ".weighted" : "");
+                for (const Loop& loop : Loops((way == Way::kBisquare ? "bisquare." : "absolute.") + name)) {
+                    SCOPED_TRACE(testing::Message() << name << ", tolerance " << loop.tol << ", " << loop.budget);
+                    Fit fit{Reference(NameOf(model) + ".spoiled"), Reference("x"),
+                            weighted ? Reference("w") : Values{}};
+                    fit.tol = loop.tol;
+                    fit.iter = loop.budget;
+                    ASSERT_EQ(fit.Run(way, model), 0);
+                    EXPECT_EQ(fit.iter, loop.steps);
+                    for (size_t j = 0; j < loop.coef.size(); ++j) EXPECT_THAT(fit.coef[j], Near(loop.coef[j], 1e-8));
+                    EXPECT_THAT(fit.residue, Near(loop.error, 1e-8));
+                }
+            }
+        }
+    }
+}
+
 TEST_F(RobustFits, BudgetsOfPasses) {
     for (const Model model : kModels) {
         for (const int32_t budget : {std::numeric_limits<int32_t>::min(), -1, 0, 1, 2}) {
