@@ -57,7 +57,8 @@ KRNUMER_API int32_t PolyRootsNtBst_head(KrHandle coef, KrHandle newtonGuesses, i
  *                       roots, and zeros behind them. Emptied on failure
  * @param[in]     limit  how often the step towards a root may be turned in a row before the search is given up
  * @param[out]    err    status: 0; -20003 when `coef` is empty; -20063 for a coefficient that is not finite, and when
- *                       nothing but a constant is left; -20062 without convergence; -20001 without memory
+ *                       nothing but a constant is left; -20062 without convergence, also when a root is beyond the
+ *                       range of doubles; -20001 without memory
  * @return               0
  */
 KRNUMER_API int32_t CxPolyRoots_head(KrHandle coef, const int32_t* limit, int32_t* err);
@@ -108,9 +109,10 @@ KRNUMER_API int32_t CxMultPolyRoots_head(KrHandle coef, int32_t distinct, double
  * @param[out] pCofactor      p over the divisor; touched only where `wantCofactors` is 1, or by a failure
  * @param[out] qCofactor      q over the divisor, likewise
  * @param[in]  wantCofactors  1 for the cofactors
- * @return                    0; -20003 when `p` or `q` is empty; -20063 for a coefficient that is not finite; -20111
- *                            when one polynomial is 0; -20062 when the singular values do not converge; -20001 without
- *                            memory or when an output cannot be sized. All outputs are emptied by a failure
+ * @return                    0; -20003 when `p` or `q` is empty; -20063 for a coefficient that is not finite, as it
+ *                            comes or over the highest one; -20111 when one polynomial is 0; -20062 when the singular
+ *                            values do not converge; -20001 without memory or when an output cannot be sized. All
+ *                            outputs are emptied by a failure
  */
 KRNUMER_API int32_t PolyGCD_H(KrHandle p, KrHandle q, double tol, KrHandle gcd, KrHandle pCofactor, KrHandle qCofactor,
                               int32_t wantCofactors);

@@ -134,6 +134,8 @@ int32_t PolyGCDCore(const T* p, int32_t p_size, const T* q, int32_t q_size, doub
     if (Copy(longer.coefficients, longer.size, &a) || Copy(shorter.coefficients, shorter.size, &b)) return kOutOfMemory;
     Normalise(a.coefficients.data(), a.size);
     Normalise(b.coefficients.data(), b.size);
+    if (HasUnusable(a.coefficients.data(), Count(a.size)) || HasUnusable(b.coefficients.data(), Count(b.size)))
+        return kBadCoefficient;
 
     Polynomial<T>* const u = swapped ? q_cofactor : p_cofactor;
     Polynomial<T>* const v = swapped ? p_cofactor : q_cofactor;

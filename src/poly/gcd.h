@@ -19,7 +19,8 @@ struct Polynomial {
 // The divisor of p and q, with the highest coefficient 1, and what is left of each. A divisor is seen where the least
 // singular value of a Sylvester matrix of c columns is below sqrt(c) tol; a tol that is not positive means 1e-8.
 //
-// kEmptyInput, kBadCoefficient for data that cannot be used, kZeroPolynomial; kNoConvergence, kOutOfMemory.
+// kEmptyInput, kBadCoefficient for data that cannot be used, as they come or over the highest coefficient,
+// kZeroPolynomial; kNoConvergence, kOutOfMemory.
 template <class T>
 int32_t PolyGCDCore(const T* p, int32_t p_size, const T* q, int32_t q_size, double tol, Polynomial<T>* gcd,
                     Polynomial<T>* p_cofactor, Polynomial<T>* q_cofactor);

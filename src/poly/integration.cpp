@@ -21,9 +21,12 @@ double Panel(const double* y) {
 
 constexpr double kFactor[] = {0.0, 0.5, 0.3333333333333333, 0.125, 0.022222222222222223};
 
+// A panel at the end of rules with more intervals. Three samples are summed from the middle on.
 template <int kIntervals>
 double LastPanel(const double* y, int32_t n, double h) {
-    return Panel<kIntervals>(y + n - 1 - kIntervals) * h * kFactor[kIntervals];
+    const double* const last = y + n - 1 - kIntervals;
+    const double panel = kIntervals == 2 ? 4.0 * last[1] + last[2] + last[0] : Panel<kIntervals>(last);
+    return panel * h * kFactor[kIntervals];
 }
 
 template <int kIntervals>

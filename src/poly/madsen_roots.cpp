@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <cmath>
 #include <complex>
+#include <cstdint>
 
 #include "frame/numeric.h"
 #include "frame/scratch.h"
@@ -19,6 +20,16 @@ double Magnitude(Complex z) {
 
 bool IsFinite(Complex z) {
     return std::isfinite(z.re) && std::isfinite(z.im);
+}
+
+// Of the larger part.
+int Exponent(Complex z) {
+    return std::ilogb(std::max(std::fabs(z.re), std::fabs(z.im)));
+}
+
+// z times a power of 2, exactly unless it overflows or underflows.
+Complex Shifted(Complex z, int exponent) {
+    return {std::ldexp(z.re, exponent), std::ldexp(z.im, exponent)};
 }
 
 Complex SquareRoot(Complex z) {
@@ -98,10 +109,6 @@ int32_t Descent::Find(int32_t limit, Complex* root) const {
     constexpr Complex kAside = {0.8, 0.6};   // turns a step that is too long
     constexpr int32_t kMostPasses = 2000;    // data that overflow may wander without end
     Point point{{0.0, 0.0}, Magnitude(c[0])};
-    if (point.height == 0.0) {
-        *root = point.z;
-        return kOk;
-    }
     const double noise = (degree - 1) * point.height * kNoise;
     Complex slope = c[1];
     Complex step = FirstStep();
@@ -155,13 +162,42 @@ void Deflate(Complex* c, int32_t degree, Complex root) {
     }
 }
 
+// Finds one root. The search sees p(2^e z) with the root of least modulus near 1 and the constant near the largest
+// coefficient, so that nothing on its way overflows; what underflows is small against the constant.
+int32_t FindRoot(const Complex* c, int32_t degree, int32_t limit, Complex* work, Complex* root) {
+    *root = {0.0, 0.0};
+    if (c[0] == Complex{}) return kOk;
+    constexpr std::int64_t kVanishing = -4000;
+    const int constant = Exponent(c[0]);
+    double least = kInfinity;
+    for (int32_t k = 1; k <= degree; ++k)
+        if (c[k] != Complex{}) least = std::min(least, static_cast<double>(constant - Exponent(c[k])) / k);
+    const int e = static_cast<int>(std::floor(least));
+    for (int32_t k = 0; k <= degree; ++k)
+        work[k] = Shifted(c[k], static_cast<int>(std::max(std::int64_t{k} * e - constant, kVanishing)));
+    const int32_t status = Descent{work, degree}.Find(limit, root);
+    *root = Shifted(*root, e);
+    return status;
+}
+
+// The root of c1^2 - 4 c0 c2, whose terms may overflow or underflow where their root does not.
+Complex DiscriminantRoot(const Complex* c) {
+    if (c[0] == Complex{}) return c[1];
+    const int skew = (Exponent(c[0]) - Exponent(c[2])) / 2;
+    int size = Exponent(c[0]) - skew;
+    if (c[1] != Complex{}) size = std::max(size, Exponent(c[1]));
+    const Complex linear = Shifted(c[1], -size);
+    const Complex product = Shifted(c[0], -size - skew) * Shifted(c[2], -size + skew);
+    return Shifted(SquareRoot(linear * linear - 4.0 * product), size);
+}
+
 // Without the cancellation of the school formula.
 void QuadraticRoots(const Complex* c, Complex roots[2]) {
     if (c[0] == Complex{} && c[1] == Complex{}) {
         roots[0] = roots[1] = {0.0, 0.0};
         return;
     }
-    const Complex s = SquareRoot(c[1] * c[1] - 4.0 * (c[0] * c[2]));
+    const Complex s = DiscriminantRoot(c);
     const Complex plus = c[1] + s;
     const Complex minus = c[1] - s;
     const Complex larger = Magnitude(plus) >= Magnitude(minus) ? plus : minus;
@@ -170,18 +206,18 @@ void QuadraticRoots(const Complex* c, Complex roots[2]) {
 }
 
 // Multiplies by a power of 2, which moves no root, so that the largest and the smallest coefficient are equally far
-// from overflow and underflow.
+// from overflow and underflow; but upwards only as long as deflation keeps its room below overflow.
 void Scale(Complex* c, int32_t n) {
-    const auto exponent_of = [](Complex z) { return std::ilogb(std::max(std::fabs(z.re), std::fabs(z.im))); };
-    int largest = exponent_of(c[n - 1]);
+    constexpr int kLargest = 960;
+    int largest = Exponent(c[n - 1]);
     int smallest = largest;
     for (int32_t k = 0; k < n - 1; ++k) {
         if (c[k] == Complex{}) continue;
-        largest = std::max(largest, exponent_of(c[k]));
-        smallest = std::min(smallest, exponent_of(c[k]));
+        largest = std::max(largest, Exponent(c[k]));
+        smallest = std::min(smallest, Exponent(c[k]));
     }
-    const int exponent = -(largest + smallest) / 2;
-    for (int32_t k = 0; k < n; ++k) c[k] = {std::ldexp(c[k].re, exponent), std::ldexp(c[k].im, exponent)};
+    const int exponent = std::min(-(largest + smallest) / 2, std::max(kLargest - largest, 0));
+    for (int32_t k = 0; k < n; ++k) c[k] = Shifted(c[k], exponent);
 }
 
 }  // namespace
@@ -192,19 +228,21 @@ int32_t MadsenRoots(const Complex* c, int32_t n, int32_t limit, Complex* roots, 
     while (n > 0 && c[n - 1] == Complex{}) --n;
     if (n < 2) return kBadCoefficient;
     Scratch<Complex> rest(Count(n));
-    if (!rest) return kOutOfMemory;
+    Scratch<Complex> work(Count(n));
+    if (!rest || !work) return kOutOfMemory;
     *count = n - 1;
     for (; c[0] == Complex{}; ++c, --n) *roots++ = {0.0, 0.0};
+    Complex* const first = roots;
     std::copy_n(c, n, rest.data());
     Scale(rest.data(), n);
     int32_t degree = n - 1;
     for (; degree > 2; --degree) {
-        if (const int32_t status = Descent{rest.data(), degree}.Find(limit, roots)) return status;
+        if (const int32_t status = FindRoot(rest.data(), degree, limit, work.data(), roots)) return status;
         Deflate(rest.data(), degree, *roots++);
     }
     if (degree == 2) QuadraticRoots(rest.data(), roots);
     if (degree == 1) *roots = -rest[0] / rest[1];
-    return kOk;
+    return std::all_of(first, first + n - 1, IsFinite) ? kOk : kNoConvergence;
 }
 
 }  // namespace krnumer

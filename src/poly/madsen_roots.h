@@ -12,7 +12,8 @@ namespace krnumer {
 // most n - 1, as zeros in the place of the highest coefficients stand for nothing. `limit` is the number of times that
 // the step towards a root may be turned in a row.
 //
-// kEmptyInput; kBadCoefficient for coefficients that are not finite and for constants; kNoConvergence; kOutOfMemory.
+// kEmptyInput; kBadCoefficient for coefficients that are not finite and for constants; kNoConvergence, also where a
+// root overflows; kOutOfMemory.
 int32_t MadsenRoots(const Complex* c, int32_t n, int32_t limit, Complex* roots, int32_t* count);
 
 }  // namespace krnumer

@@ -42,6 +42,11 @@ TEST(Integration, IntervalsLeftOver) {
     EXPECT_THAT(Integral({0, 1, 4, 9, 16, 25}, 1, 3), Near(64.0 / 3.0 + 20.5, 1e-15)) << "one panel and a trapezoid";
 }
 
+TEST(Integration, LastThreeSamplesAreSummedFromTheMiddle) {
+    constexpr double kHuge = 0x1p54;
+    EXPECT_EQ(Integral({0, 0, 0, 1, kHuge / 4, -kHuge}, 1, 2), 3 * 0.125 + 1 * 0.3333333333333333);
+}
+
 TEST(Integration, StepCountsByItsAbsoluteValue) {
     for (int32_t rule = 0; rule < 4; ++rule)
         EXPECT_EQ(Integral({1, 5, 2, 7, 3, 3}, -0.3, rule), Integral({1, 5, 2, 7, 3, 3}, 0.3, rule));

@@ -219,6 +219,7 @@ TEST_F(Divisors, RefuseWhatCannotBeDivided) {
     expect({1}, {}, kEmptyInput);
     expect({0}, {kQuietNaN}, kBadCoefficient);
     expect({kInfinity}, {1}, kBadCoefficient);
+    expect({1e300, 1e-300}, {5}, kBadCoefficient);
     expect({0, 0}, {1, 1}, kZeroPolynomial);
     expect({1, 1}, {0}, kZeroPolynomial);
 }

@@ -3,6 +3,7 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <cmath>
 #include <random>
 
@@ -100,6 +101,32 @@ TEST_F(ComplexRoots, FindWideRanges) {
     ASSERT_EQ(roots_.size(), 3U);
     EXPECT_NEAR(roots_[0].re / -1e-200, 1.0, 1e-14);
     EXPECT_NEAR(Modulus(roots_[1]) / 1e75, 1.0, 1e-12);
+}
+
+TEST_F(ComplexRoots, FindRootsAcrossTheRangeOfDoubles) {
+    // Newton's polygon has a corner at every coefficient: each root is close to minus the quotient of two neighbours.
+    for (const ComplexValues& coef : {ComplexValues{{1e300, 0}, {0, 1e150}, {-1e-100, 0}},
+                                      ComplexValues{{1e-300, 0}, {1e-100, 1e-100}, {1e50, 0}, {1e150, 0}, {0, 1e200}},
+                                      ComplexValues{{1e-320, 0}, {1e-100, 0}, {1e100, 0}, {1e290, 1e290}},
+                                      ComplexValues{{1e308, 0}, {1e120, 0}, {-1e-90, 0}, {1e-320, 0}}}) {
+        ASSERT_EQ(Find(coef), 0);
+        for (std::size_t k = 0; k < roots_.size(); ++k) {
+            const Complex expected = -coef[k] / coef[k + 1];
+            const Complex nearest = *std::min_element(roots_.begin(), roots_.end(), [&](Complex a, Complex b) {
+                return Modulus((a - expected) / expected) < Modulus((b - expected) / expected);
+            });
+            EXPECT_LT(Modulus(nearest / expected - Complex{1, 0}), 1e-3) << expected.re << ' ' << expected.im;
+        }
+    }
+}
+
+TEST_F(ComplexRoots, AreNotFoundBeyondTheRangeOfDoubles) {
+    for (const ComplexValues& coef :
+         {ComplexValues{{1e300, 0}, {1e-300, 0}}, ComplexValues{{1, 0}, {1e300, 0}, {1e-300, 0}},
+          ComplexValues{{1, 0}, {2, 0}, {3, 0}, {4, 0}, {1e-320, 0}}}) {
+        EXPECT_EQ(Find(coef), kNoConvergence);
+        EXPECT_TRUE(roots_.empty());
+    }
 }
 
 TEST_F(ComplexRoots, PutZerosFirst) {
