@@ -1,6 +1,8 @@
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <cmath>
+#include <random>
 #include <vector>
 
 #include "fft/fft.h"
@@ -134,6 +136,45 @@ TEST(Fft, AgreesWithTheDefinitionAtLargeLengths) {
     for (int32_t n : {2048, 2187, 2809, 3125, 3127, 4096, 5000, 8192, 10000, 10007, 12167, 16384, 30030, 65536, 65537,
                       100000, 146410, 262144, 1048576}) {
         ExpectAgreesWithDefinition(n);
+    }
+}
+
+// Few samples that are not zero make every value of the spectrum a short sum.
+TEST(Fft, AgreesWithTheDefinitionOfSparseSamplesAtTheLargestLengths) {
+    for (int32_t n : {2000000, 2097143, 4194304}) {
+        std::mt19937 random(static_cast<uint32_t>(n));
+        std::vector<int32_t> places(20);
+        std::vector<Complex> x(static_cast<size_t>(n));
+        for (int32_t& place : places) {
+            place = static_cast<int32_t>(random() % static_cast<uint32_t>(n));
+            x[static_cast<size_t>(place)] = {1.0 + static_cast<double>(place) / n, 0.5};
+        }
+        const std::vector<Complex> y = Transform(x);
+        std::vector<double> real(x.size());
+        for (size_t j = 0; j < x.size(); ++j) real[j] = x[j].re;
+        const std::vector<double> half_complex = Transform(real);
+
+        std::vector<Complex> computed, exact, computed_real, exact_real;
+        std::sort(places.begin(), places.end());
+        places.erase(std::unique(places.begin(), places.end()), places.end());
+        for (int i = 0; i < 2000; ++i) {
+            const auto k = static_cast<int32_t>(random() % static_cast<uint32_t>(n / 2 - 1)) + 1;
+            LongComplex sum, real_sum;
+            for (int32_t place : places) {
+                const long double angle =
+                    6.28318530717958647692529L * static_cast<long double>(int64_t{k} * place % n) / n;
+                const LongComplex rotation(std::cos(angle), -std::sin(angle));
+                const Complex sample = x[static_cast<size_t>(place)];
+                sum += LongComplex(sample.re, sample.im) * rotation;
+                real_sum += static_cast<long double>(sample.re) * rotation;
+            }
+            computed.push_back(y[static_cast<size_t>(k)]);
+            exact.push_back({static_cast<double>(sum.real()), static_cast<double>(sum.imag())});
+            computed_real.push_back({half_complex[static_cast<size_t>(k)], half_complex[static_cast<size_t>(n - k)]});
+            exact_real.push_back({static_cast<double>(real_sum.real()), static_cast<double>(real_sum.imag())});
+        }
+        EXPECT_LT(RelativeError(computed, exact), ErrorBound(n)) << "complex, n = " << n;
+        EXPECT_LT(RelativeError(computed_real, exact_real), ErrorBound(n)) << "real, n = " << n;
     }
 }
 
