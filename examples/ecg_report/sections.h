@@ -25,3 +25,4 @@ Section SignalSection(const Recording& ecg);
 Section StatisticsSection(const Recording& ecg);
 Section WavesSection(const Recording& ecg);
 Section WindowsSection(const Recording& ecg);
+Section RhythmSection(const Recording& ecg);
