@@ -119,13 +119,12 @@ int32_t LUSolve(const T* lu, const int32_t* pivots, const T* b, int32_t n, T* x)
 template <class T>
 int32_t LUInverse(const T* lu, const int32_t* pivots, int32_t order, T* inverse) {
     if (order < 1) return kEmptyInput;
-    const size_t n = Count(order);
-    Scratch<T> sums(kTogether * n), factors;
-    if (!sums) return kOutOfMemory;
+    const size_t n = Count(order), sums_count = kTogether * n;
+    Scratch<T> work(sums_count + (inverse == lu ? n * n : 0));
+    if (!work) return kOutOfMemory;
     if (inverse == lu) {
-        if (!factors.Allocate(n * n)) return kOutOfMemory;
-        std::copy_n(lu, n * n, factors.data());
-        lu = factors.data();
+        std::copy_n(lu, n * n, work.data() + sums_count);
+        lu = work.data() + sums_count;
     }
     std::fill_n(inverse, n * n, T{});
     for (size_t i = 0; i < n; ++i) inverse[i * (n + 1)] = FromReal<T>(1.0);
@@ -133,7 +132,7 @@ int32_t LUInverse(const T* lu, const int32_t* pivots, int32_t order, T* inverse)
         const size_t other = Count(pivots[i]);
         if (other != i) std::swap_ranges(inverse + i * n, inverse + (i + 1) * n, inverse + other * n);
     }
-    ManyColumns<T> columns(lu, n, inverse, sums.data());
+    ManyColumns<T> columns(lu, n, inverse, work.data());
     columns.SolveUnitLower();
     columns.SolveUpper();
     return kOk;
