@@ -13,7 +13,9 @@ namespace {
 // The rotations of one sweep on one side, gathered so that they meet the vectors all at once.
 class Sweep {
   public:
-    Sweep(VectorRows vectors, double* c, double* s) : vectors_(vectors), c_(c), s_(s) {}
+    // `work` has room for 2 n numbers where there are vectors, and is not looked at otherwise.
+    Sweep(VectorRows vectors, double* work, std::ptrdiff_t n)
+        : vectors_(vectors), c_(work), s_(vectors ? work + n : nullptr) {}
 
     void Set(std::ptrdiff_t j, double c, double s) {
         if (!vectors_) return;
@@ -39,8 +41,8 @@ class Iteration {
           norm_(norm),
           left_(left),
           right_(right),
-          left_sweep_(left, work, work + b.n),
-          right_sweep_(right, work + 2 * b.n, work + 3 * b.n) {}
+          left_sweep_(left, work, b.n),
+          right_sweep_(right, right ? work + 2 * b.n : nullptr, b.n) {}
 
     // Sweeps over the block that ends at k until w[k] is a singular value.
     int32_t Converge(std::ptrdiff_t k) {

@@ -65,6 +65,7 @@ void SweepUp(std::ptrdiff_t l, std::ptrdiff_t m, double* d, double* e, VectorRow
 int32_t DiagonaliseTridiagonal(std::ptrdiff_t n, double* d, double* e, VectorRows vectors, double* work,
                                Negligible negligible) {
     e[n - 1] = 0.0;
+    double* const sines = vectors ? work + n : nullptr;
     double largest = 0.0;
     const auto is_negligible = [&](std::ptrdiff_t m) {
         if (negligible == Negligible::kAgainstLargest) return std::fabs(e[m]) <= kEpsilon * largest;
@@ -78,7 +79,7 @@ int32_t DiagonaliseTridiagonal(std::ptrdiff_t n, double* d, double* e, VectorRow
             while (m < n - 1 && !is_negligible(m)) ++m;
             if (m == l) break;
             if (sweeps == kQlIterationLimit) return kNoConvergence;
-            SweepUp(l, m, d, e, vectors, work, work + n);
+            SweepUp(l, m, d, e, vectors, work, sines);
         }
     }
     return kOk;
