@@ -3,15 +3,17 @@
 
 PRESET ?= release
 PREFIX ?= /usr/local
+FUZZ_SECONDS ?= 600
 JOBS ?= $(shell nproc)
 BUILD = build/$(PRESET)
 
-.PHONY: help build test demo docs bench format lint install package clean
+.PHONY: help build test demo docs bench format lint fuzz install package clean
 
 help:
 	@echo "make test      build and run the whole suite      make demo      report on recorded signals"
 	@echo "make docs      reference as HTML                   make bench     measure beside the peers"
 	@echo "make format    clang-format everything             make lint      clang-format and clang-tidy checks"
+	@echo "make fuzz      look for inputs that break calls"
 	@echo "make install   into PREFIX=$(PREFIX)           make package   Debian packages"
 
 build:
@@ -44,6 +46,10 @@ format:
 lint:
 	tools/setup build test lint
 	tools/lint $(LINT_ARGS)
+
+fuzz:
+	tools/setup build fuzz
+	tools/fuzz $(FUZZ_SECONDS) $(JOBS)
 
 install: build
 	cmake --install $(BUILD) --prefix $(PREFIX)

@@ -6,7 +6,7 @@
 #include <new>
 
 // The run time's own functions, under the names that stay reachable when malloc and its kin are replaced.
-#if defined(__SANITIZE_ADDRESS__)
+#if defined(KRNUMER_ASAN)
 #define UNDERLYING(name) __interceptor_##name
 #else
 #define UNDERLYING(name) __libc_##name
@@ -29,14 +29,17 @@ struct State {
     bool refused;
     int32_t allocations;
     int32_t refuse;
+    uint64_t limit;  // 0: none
     int64_t live;
     void* blocks[kMostBlocks];
 };
 thread_local State state;
 
-bool Refuse() {
-    if (!state.armed || ++state.allocations != state.refuse) return false;
-    state.refused = true;
+bool Refuse(std::size_t bytes) {
+    if (!state.armed) return false;
+    const bool chosen = ++state.allocations == state.refuse;
+    if (!chosen && (state.limit == 0 || bytes <= state.limit)) return false;
+    state.refused = chosen;
     errno = ENOMEM;
     return true;
 }
@@ -79,24 +82,32 @@ int32_t ArmedAllocator::allocations() {
 bool ArmedAllocator::refused() {
     return state.refused;
 }
+AllocationLimit::AllocationLimit(uint64_t bytes) {
+    state.limit = bytes;
+}
+AllocationLimit::~AllocationLimit() {
+    state.limit = 0;
+}
 int64_t LiveAllocations() {
     return state.live;
 }
 
 }  // namespace sweep
 
+// Seen by the shared libraries of the process as well.
+#pragma GCC visibility push(default)
 extern "C" {
 
 void* malloc(std::size_t bytes) {
-    return sweep::Refuse() ? nullptr : sweep::Taken(UNDERLYING(malloc)(bytes));
+    return sweep::Refuse(bytes) ? nullptr : sweep::Taken(UNDERLYING(malloc)(bytes));
 }
 
 void* calloc(std::size_t count, std::size_t bytes) {
-    return sweep::Refuse() ? nullptr : sweep::Taken(UNDERLYING(calloc)(count, bytes));
+    return sweep::Refuse(count * bytes) ? nullptr : sweep::Taken(UNDERLYING(calloc)(count, bytes));
 }
 
 void* realloc(void* block, std::size_t bytes) {
-    if (sweep::Refuse()) return nullptr;
+    if (sweep::Refuse(bytes)) return nullptr;
     void* const moved = UNDERLYING(realloc)(block, bytes);
     if (moved == nullptr) return nullptr;
     sweep::GivenBack(block);
@@ -108,3 +119,4 @@ void free(void* block) {
     UNDERLYING(free)(block);
 }
 }
+#pragma GCC visibility pop

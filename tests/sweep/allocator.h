@@ -19,6 +19,15 @@ class ArmedAllocator {
     static bool refused();         // whether the last armed stretch met its refusal
 };
 
+// While one exists, armed stretches of this thread get no block longer than its bytes.
+class AllocationLimit {
+  public:
+    explicit AllocationLimit(uint64_t bytes);
+    ~AllocationLimit();
+    AllocationLimit(const AllocationLimit&) = delete;
+    AllocationLimit& operator=(const AllocationLimit&) = delete;
+};
+
 // Blocks that armed stretches of this thread took and nobody has freed since.
 int64_t LiveAllocations();
 

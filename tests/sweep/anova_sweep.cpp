@@ -17,8 +17,7 @@ SWEEP(Anova1Way_head) {
     const KrHandle a = scene.Integers(kA);
     double* s[7];
     for (double*& scalar : s) scalar = scene.Number();
-    return scene.Call(
-        [&] { return Anova1Way_head(y, a, &kLevels, s[0], s[1], s[2], s[3], s[4], s[5], s[6], scene.err()); });
+    return scene.Call(Anova1Way_head, y, a, &kLevels, s[0], s[1], s[2], s[3], s[4], s[5], s[6], scene.err());
 }
 
 SWEEP(Anova2Way_head) {
@@ -29,8 +28,7 @@ SWEEP(Anova2Way_head) {
     double* p[3];
     for (double*& scalar : p) scalar = scene.Number();
     const int32_t r = 4;
-    return scene.Call(
-        [&] { return Anova2Way_head(y, a, b, &r, &kLevels, &kLevels, table, p[0], p[1], p[2], scene.err()); });
+    return scene.Call(Anova2Way_head, y, a, b, &r, &kLevels, &kLevels, table, p[0], p[1], p[2], scene.err());
 }
 
 SWEEP(ANOVA3Way_head) {
@@ -42,15 +40,13 @@ SWEEP(ANOVA3Way_head) {
     double* p[7];
     for (double*& scalar : p) scalar = scene.Number();
     const int32_t r = 2;
-    return scene.Call([&] {
-        return ANOVA3Way_head(y, a, b, c, &r, &kLevels, &kLevels, &kLevels, table, p[0], p[1], p[2], p[3], p[4], p[5],
-                              p[6], scene.err());
-    });
+    return scene.Call(ANOVA3Way_head, y, a, b, c, &r, &kLevels, &kLevels, &kLevels, table, p[0], p[1], p[2], p[3], p[4],
+                      p[5], p[6], scene.err());
 }
 
 SWEEP(Contingency_head) {
     const KrHandle counts = scene.IntegerMatrix(2, 3, {10, 20, 30, 6, 9, 17});
     double* chi_square = scene.Number();
     double* p = scene.Number();
-    return scene.Call([&] { return Contingency_head(counts, chi_square, p, scene.err()); });
+    return scene.Call(Contingency_head, counts, chi_square, p, scene.err());
 }

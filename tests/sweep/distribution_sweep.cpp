@@ -8,7 +8,7 @@ namespace {
 template <class... Parameters, class... Arguments>
 int32_t Scalars(sweep::Scene& scene, int32_t (*function)(Parameters...), Arguments... arguments) {
     double* const out = scene.Number();
-    return scene.Call([&] { return function(&arguments..., out, scene.err()); });
+    return scene.Call(function, &arguments..., out, scene.err());
 }
 
 }  // namespace
@@ -16,7 +16,7 @@ int32_t Scalars(sweep::Scene& scene, int32_t (*function)(Parameters...), Argumen
 SWEEP(NormDist_head) {
     const double x = 1.5;
     double* const p = scene.Number();
-    return scene.Call([&] { return NormDist_head(&x, p); });
+    return scene.Call(NormDist_head, &x, p);
 }
 SWEEP(InvNdist_head) {
     return Scalars(scene, InvNdist_head, 0.3);

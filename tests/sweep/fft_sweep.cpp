@@ -28,7 +28,7 @@ using Simple = int32_t(KrHandle, KrHandle, void**);
 
 int32_t PlaySimple(sweep::Scene& scene, Simple* function, KrHandle x, KrHandle y) {
     void* slot = nullptr;
-    return scene.Call([&] { return function(x, y, &slot); });
+    return scene.Call(function, x, y, &slot);
 }
 
 using Forward2d = int32_t(KrHandle, int32_t, int32_t, int32_t, int32_t, int32_t, KrHandle, void**, void**);
@@ -36,7 +36,7 @@ using Forward2d = int32_t(KrHandle, int32_t, int32_t, int32_t, int32_t, int32_t,
 int32_t PlayForward(sweep::Scene& scene, Forward2d* function, KrHandle x) {
     const KrHandle y = scene.OutComplexMatrix(kKept);
     void *columns = nullptr, *rows = nullptr;
-    return scene.Call([&] { return function(x, 1, 0, 23, 8, 1, y, &columns, &rows); });
+    return scene.Call(function, x, 1, 0, 23, 8, 1, y, &columns, &rows);
 }
 
 using Inverse2d = int32_t(KrHandle, int32_t, KrHandle, void**, void**);
@@ -44,7 +44,7 @@ using Inverse2d = int32_t(KrHandle, int32_t, KrHandle, void**, void**);
 int32_t PlayInverse(sweep::Scene& scene, Inverse2d* function, KrHandle y) {
     const KrHandle x = scene.ComplexMatrix(5, 6, Complexes(30));
     void *columns = nullptr, *rows = nullptr;
-    return scene.Call([&] { return function(x, 1, y, &columns, &rows); });
+    return scene.Call(function, x, 1, y, &columns, &rows);
 }
 
 }  // namespace
@@ -88,26 +88,26 @@ SWEEP(CxQMFFTH80) {
     const KrHandle x = scene.Complexes(Complexes(9));
     const KrHandle y = scene.OutComplexes(kKept);
     void* slot = nullptr;
-    return scene.Call([&] { return CxQMFFTH80(x, y, &slot, 2, 12, 1); });
+    return scene.Call(CxQMFFTH80, x, y, &slot, 2, 12, 1);
 }
 SWEEP(InvCxQMFFTH80) {
     const KrHandle x = scene.Complexes(Complexes(9));
     const KrHandle y = scene.OutComplexes(kKept);
     void* slot = nullptr;
-    return scene.Call([&] { return InvCxQMFFTH80(x, y, &slot, 1); });
+    return scene.Call(InvCxQMFFTH80, x, y, &slot, 1);
 }
 SWEEP(ReQMFFTH80) {
     const KrHandle x = scene.Doubles(Doubles(9));
     const KrHandle y = scene.OutComplexes(kKept);
     void* slot = nullptr;
     scene.SurvivesRefusedAllocation();
-    return scene.Call([&] { return ReQMFFTH80(x, y, &slot, 2, 12, 1); });
+    return scene.Call(ReQMFFTH80, x, y, &slot, 2, 12, 1);
 }
 SWEEP(InvReQMFFTH80) {
     const KrHandle x = scene.Complexes(Complexes(10));
     const KrHandle y = scene.OutDoubles(kKept);
     void* slot = nullptr;
-    return scene.Call([&] { return InvReQMFFTH80(x, y, &slot, 1); });
+    return scene.Call(InvReQMFFTH80, x, y, &slot, 1);
 }
 
 SWEEP(CxFFT2D_H) {

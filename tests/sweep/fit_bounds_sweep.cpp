@@ -20,9 +20,8 @@ SWEEP(ConfBndLinear_head) {
     const KrHandle lower_coef = scene.OutDoubles();
     double* d_slope = scene.Number(sweep::OnFailure::kOther);      // 0
     double* d_intercept = scene.Number(sweep::OnFailure::kOther);  // 0
-    return scene.Call([&] {
-        return ConfBndLinear_head(y, x, w, 1.5, 0.5, 0.9, upper, lower, upper_coef, lower_coef, d_slope, d_intercept);
-    });
+    return scene.Call(ConfBndLinear_head, y, x, w, 1.5, 0.5, 0.9, upper, lower, upper_coef, lower_coef, d_slope,
+                      d_intercept);
 }
 
 SWEEP(ConfBndExp_head) {
@@ -35,8 +34,7 @@ SWEEP(ConfBndExp_head) {
     const KrHandle lower_coef = scene.OutDoubles();
     double* d_a = scene.Number(sweep::OnFailure::kOther);  // 0
     double* d_b = scene.Number(sweep::OnFailure::kOther);  // 0
-    return scene.Call(
-        [&] { return ConfBndExp_head(y, x, w, 2.0, 0.2, 0.9, upper, lower, upper_coef, lower_coef, d_a, d_b); });
+    return scene.Call(ConfBndExp_head, y, x, w, 2.0, 0.2, 0.9, upper, lower, upper_coef, lower_coef, d_a, d_b);
 }
 
 SWEEP(ConfBndPower_head) {
@@ -49,8 +47,7 @@ SWEEP(ConfBndPower_head) {
     const KrHandle lower_coef = scene.OutDoubles();
     double* d_a = scene.Number(sweep::OnFailure::kOther);  // 0
     double* d_b = scene.Number(sweep::OnFailure::kOther);  // 0
-    return scene.Call(
-        [&] { return ConfBndPower_head(y, x, w, 1.5, 0.7, 0.9, upper, lower, upper_coef, lower_coef, d_a, d_b); });
+    return scene.Call(ConfBndPower_head, y, x, w, 1.5, 0.7, 0.9, upper, lower, upper_coef, lower_coef, d_a, d_b);
 }
 
 SWEEP(ConfBndLog_head) {
@@ -63,8 +60,7 @@ SWEEP(ConfBndLog_head) {
     const KrHandle lower_coef = scene.OutDoubles();
     double* d_a = scene.Number(sweep::OnFailure::kOther);  // 0
     double* d_b = scene.Number(sweep::OnFailure::kOther);  // 0
-    return scene.Call(
-        [&] { return ConfBndLog_head(y, x, w, 10.0, 4.0, 2.0, 0.9, upper, lower, upper_coef, lower_coef, d_a, d_b); });
+    return scene.Call(ConfBndLog_head, y, x, w, 10.0, 4.0, 2.0, 0.9, upper, lower, upper_coef, lower_coef, d_a, d_b);
 }
 
 SWEEP(ConfBndGauss_head) {
@@ -78,9 +74,8 @@ SWEEP(ConfBndGauss_head) {
     double* d_a = scene.Number(sweep::OnFailure::kOther);      // 0
     double* d_mu = scene.Number(sweep::OnFailure::kOther);     // 0
     double* d_sigma = scene.Number(sweep::OnFailure::kOther);  // 0
-    return scene.Call([&] {
-        return ConfBndGauss_head(y, x, w, 5.0, 3.0, 1.5, 0.9, upper, lower, upper_coef, lower_coef, d_a, d_mu, d_sigma);
-    });
+    return scene.Call(ConfBndGauss_head, y, x, w, 5.0, 3.0, 1.5, 0.9, upper, lower, upper_coef, lower_coef, d_a, d_mu,
+                      d_sigma);
 }
 
 SWEEP(PredBndLinear_head) {
@@ -89,7 +84,7 @@ SWEEP(PredBndLinear_head) {
     const KrHandle w = scene.Doubles(kW);
     const KrHandle upper = scene.OutDoubles();
     const KrHandle lower = scene.OutDoubles();
-    return scene.Call([&] { return PredBndLinear_head(y, x, w, 1.5, 0.5, 0.9, upper, lower); });
+    return scene.Call(PredBndLinear_head, y, x, w, 1.5, 0.5, 0.9, upper, lower);
 }
 
 SWEEP(PredBndExp_head) {
@@ -98,7 +93,7 @@ SWEEP(PredBndExp_head) {
     const KrHandle w = scene.Doubles(kW);
     const KrHandle upper = scene.OutDoubles();
     const KrHandle lower = scene.OutDoubles();
-    return scene.Call([&] { return PredBndExp_head(y, x, w, 2.0, 0.2, 0.9, upper, lower); });
+    return scene.Call(PredBndExp_head, y, x, w, 2.0, 0.2, 0.9, upper, lower);
 }
 
 SWEEP(PredBndPower_head) {
@@ -107,7 +102,7 @@ SWEEP(PredBndPower_head) {
     const KrHandle w = scene.Doubles(kW);
     const KrHandle upper = scene.OutDoubles();
     const KrHandle lower = scene.OutDoubles();
-    return scene.Call([&] { return PredBndPower_head(y, x, w, 1.5, 0.7, 0.9, upper, lower); });
+    return scene.Call(PredBndPower_head, y, x, w, 1.5, 0.7, 0.9, upper, lower);
 }
 
 SWEEP(PredBndLog_head) {
@@ -116,7 +111,7 @@ SWEEP(PredBndLog_head) {
     const KrHandle w = scene.Doubles(kW);
     const KrHandle upper = scene.OutDoubles();
     const KrHandle lower = scene.OutDoubles();
-    return scene.Call([&] { return PredBndLog_head(y, x, w, 10.0, 4.0, 2.0, 0.9, upper, lower); });
+    return scene.Call(PredBndLog_head, y, x, w, 10.0, 4.0, 2.0, 0.9, upper, lower);
 }
 
 SWEEP(PredBndGauss_head) {
@@ -125,7 +120,7 @@ SWEEP(PredBndGauss_head) {
     const KrHandle w = scene.Doubles(kW);
     const KrHandle upper = scene.OutDoubles();
     const KrHandle lower = scene.OutDoubles();
-    return scene.Call([&] { return PredBndGauss_head(y, x, w, 5.0, 3.0, 1.5, 0.9, upper, lower); });
+    return scene.Call(PredBndGauss_head, y, x, w, 5.0, 3.0, 1.5, 0.9, upper, lower);
 }
 
 SWEEP(GoodnessOfFit_head) {
@@ -135,5 +130,5 @@ SWEEP(GoodnessOfFit_head) {
     double* sse = scene.Number();
     double* r_square = scene.Number();
     double* rmse = scene.Number();
-    return scene.Call([&] { return GoodnessOfFit_head(y, fit, w, 0, sse, r_square, rmse); });
+    return scene.Call(GoodnessOfFit_head, y, fit, w, 0, sse, r_square, rmse);
 }

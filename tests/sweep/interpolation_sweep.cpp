@@ -14,7 +14,7 @@ int32_t PlayInterpolation(sweep::Scene& scene, Interpolate interpolate) {
     const KrHandle x = scene.Doubles(kX);
     double* value = scene.Number();
     double* estimate = scene.Number();
-    return scene.Call([&] { return interpolate(y, x, &kAt, value, estimate, scene.err()); });
+    return scene.Call(interpolate, y, x, &kAt, value, estimate, scene.err());
 }
 
 }  // namespace
@@ -31,7 +31,7 @@ SWEEP(Spline_head) {
     const KrHandle x = scene.Doubles(kX);
     const KrHandle y2 = scene.OutDoubles();
     const double slope = 0.5;
-    return scene.Call([&] { return Spline_head(y, x, &slope, &slope, y2, scene.err()); });
+    return scene.Call(Spline_head, y, x, &slope, &slope, y2, scene.err());
 }
 
 SWEEP(SpInterp_head) {
@@ -39,7 +39,7 @@ SWEEP(SpInterp_head) {
     const KrHandle x = scene.Doubles(kX);
     const KrHandle y2 = scene.Doubles({0, 1, -1, 2, -2, 1, 1, 0});
     double* value = scene.Number();
-    return scene.Call([&] { return SpInterp_head(y, x, y2, &kAt, value, scene.err()); });
+    return scene.Call(SpInterp_head, y, x, y2, &kAt, value, scene.err());
 }
 
 SWEEP(CubicSplineFit_head) {
@@ -48,7 +48,7 @@ SWEEP(CubicSplineFit_head) {
     const KrHandle w = scene.Doubles({1, 2, 1, 2, 1, 2, 1, 2});
     const KrHandle lambda = scene.Doubles({1, 2, 1, 2, 1, 2, 1});
     double* residue = scene.Number();
-    return scene.Call([&] { return CubicSplineFit_head(y, x, w, lambda, 0.5, residue); });
+    return scene.Call(CubicSplineFit_head, y, x, w, lambda, 0.5, residue);
 }
 
 SWEEP(RmvOutlierIndx_head) {
@@ -60,7 +60,7 @@ SWEEP(RmvOutlierIndx_head) {
     const KrHandle x_out = scene.OutDoubles();
     const KrHandle w_out = scene.OutDoubles();
     const KrHandle mask = scene.Replaced(scene.Bytes({9, 9}));
-    return scene.Call([&] { return RmvOutlierIndx_head(y, x, w, indices, y_out, x_out, w_out, mask); });
+    return scene.Call(RmvOutlierIndx_head, y, x, w, indices, y_out, x_out, w_out, mask);
 }
 
 SWEEP(RmvOutlierRng_head) {
@@ -72,5 +72,5 @@ SWEEP(RmvOutlierRng_head) {
     const KrHandle x_out = scene.OutDoubles();
     const KrHandle w_out = scene.OutDoubles();
     const KrHandle removed = scene.OutIntegers();
-    return scene.Call([&] { return RmvOutlierRng_head(y, x, w, range, 2, y_out, x_out, w_out, removed); });
+    return scene.Call(RmvOutlierRng_head, y, x, w, range, 2, y_out, x_out, w_out, removed);
 }

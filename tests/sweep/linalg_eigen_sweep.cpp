@@ -7,7 +7,7 @@ SWEEP(EigenValueVector_head) {
     const int32_t want_vectors = 1;
     const KrHandle w = scene.OutComplexes();
     const KrHandle v = scene.OutComplexMatrix();
-    return scene.Call([&] { return EigenValueVector_head(a, &want_vectors, w, v, scene.err()); });
+    return scene.Call(EigenValueVector_head, a, &want_vectors, w, v, scene.err());
 }
 
 SWEEP(CxEigenValueVector_head) {
@@ -15,7 +15,7 @@ SWEEP(CxEigenValueVector_head) {
     const int32_t kind = 0;
     const int32_t want_vectors = 1;
     const KrHandle w = scene.OutComplexes();
-    return scene.Call([&] { return CxEigenValueVector_head(a, &kind, &want_vectors, w, scene.err()); });
+    return scene.Call(CxEigenValueVector_head, a, &kind, &want_vectors, w, scene.err());
 }
 
 SWEEP_MORE(CxEigenValueVector_head, hermitian) {
@@ -23,7 +23,7 @@ SWEEP_MORE(CxEigenValueVector_head, hermitian) {
     const int32_t kind = 1;
     const int32_t want_vectors = 1;
     const KrHandle w = scene.OutComplexes();
-    return scene.Call([&] { return CxEigenValueVector_head(a, &kind, &want_vectors, w, scene.err()); });
+    return scene.Call(CxEigenValueVector_head, a, &kind, &want_vectors, w, scene.err());
 }
 
 SWEEP_MORE(CxEigenValueVector_head, values) {
@@ -31,24 +31,24 @@ SWEEP_MORE(CxEigenValueVector_head, values) {
     const int32_t kind = 1;
     const int32_t want_vectors = 0;
     const KrHandle w = scene.OutComplexes();
-    return scene.Call([&] { return CxEigenValueVector_head(a, &kind, &want_vectors, w, scene.err()); });
+    return scene.Call(CxEigenValueVector_head, a, &kind, &want_vectors, w, scene.err());
 }
 
 SWEEP(SymEvectorEvalue_head) {
     const KrHandle a = scene.Replaced(scene.Matrix(3, 3, {2, 1, 0, 1, 3, 1, 0, 1, 4}));
     const int32_t want_vectors = 1;
     const KrHandle w = scene.OutDoubles();
-    return scene.Call([&] { return SymEvectorEvalue_head(a, &want_vectors, w, scene.err()); });
+    return scene.Call(SymEvectorEvalue_head, a, &want_vectors, w, scene.err());
 }
 
 SWEEP(MatrixCharacteristicPoly_head) {
     const KrHandle a = scene.Matrix(2, 2, {1, 2, 3, 4});
     const KrHandle c = scene.OutDoubles();
-    return scene.Call([&] { return MatrixCharacteristicPoly_head(a, c, scene.err()); });
+    return scene.Call(MatrixCharacteristicPoly_head, a, c, scene.err());
 }
 
 SWEEP(CreateMatrixFromEVs_head) {
     const KrHandle lambda = scene.Complexes({{1, 2}, {1, -2}, {3, 0}});
     const KrHandle m = scene.OutMatrix();
-    return scene.Call([&] { return CreateMatrixFromEVs_head(lambda, m, scene.err()); });
+    return scene.Call(CreateMatrixFromEVs_head, lambda, m, scene.err());
 }

@@ -40,7 +40,7 @@ int32_t PlayLyapunov(sweep::Scene& scene, Function function) {
     const KrHandle a = Square<T>(scene);
     const KrHandle q = RightSide<T>(scene);
     double* scale = scene.Number(sweep::OnFailure::kOther);
-    return scene.Call([&] { return function(a, q, 0, scale); });
+    return scene.Call(function, a, q, 0, scale);
 }
 
 template <class T, class Function, class... Form>
@@ -49,7 +49,7 @@ int32_t PlaySylvester(sweep::Scene& scene, KrHandle b, Function function, Form..
     const KrHandle c = RightSide<T>(scene);
     double* scale = scene.Number(sweep::OnFailure::kOther);
     int32_t* singular = scene.Integer(-1);
-    return scene.Call([&] { return function(a, b, c, 0, 0, 1, form..., scale, singular); });
+    return scene.Call(function, a, b, c, 0, 0, 1, form..., scale, singular);
 }
 
 }  // namespace

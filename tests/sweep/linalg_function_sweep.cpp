@@ -14,7 +14,7 @@ KrHandle Complex(sweep::Scene& scene) {
 template <class Function>
 int32_t PlayInPlace(sweep::Scene& scene, Function function, KrHandle matrix) {
     const KrHandle a = scene.Replaced(matrix);
-    return scene.Call([&] { return function(a, scene.err()); });
+    return scene.Call(function, a, scene.err());
 }
 
 }  // namespace
@@ -38,21 +38,21 @@ SWEEP(CxMatrixSqrt_head) {
 SWEEP(MatrixLn_head) {
     const KrHandle a = Real(scene);
     const KrHandle l = scene.OutComplexMatrix();
-    return scene.Call([&] { return MatrixLn_head(a, l, scene.err()); });
+    return scene.Call(MatrixLn_head, a, l, scene.err());
 }
 
 SWEEP(MatrixSqrtH) {
     const KrHandle a = Real(scene);
     const KrHandle s = scene.OutComplexMatrix();
-    return scene.Call([&] { return MatrixSqrtH(a, s); });
+    return scene.Call(MatrixSqrtH, a, s);
 }
 
 SWEEP(MatrixPower_head) {
     const KrHandle a = scene.Replaced(Real(scene));
-    return scene.Call([&] { return MatrixPower_head(a, -5); });
+    return scene.Call(MatrixPower_head, a, -5);
 }
 
 SWEEP(CxMatrixPower_head) {
     const KrHandle a = scene.Replaced(Complex(scene));
-    return scene.Call([&] { return CxMatrixPower_head(a, 6); });
+    return scene.Call(CxMatrixPower_head, a, 6);
 }

@@ -17,73 +17,73 @@ SWEEP(Determinant_head) {
     const KrHandle a = Definite(scene);
     const int32_t type = 0;
     double* det = scene.Number();
-    return scene.Call([&] { return Determinant_head(a, &type, det, scene.err()); });
+    return scene.Call(Determinant_head, a, &type, det, scene.err());
 }
 
 SWEEP_MORE(Determinant_head, definite) {
     const KrHandle a = Definite(scene);
     const int32_t type = 1;
     double* det = scene.Number();
-    return scene.Call([&] { return Determinant_head(a, &type, det, scene.err()); });
+    return scene.Call(Determinant_head, a, &type, det, scene.err());
 }
 
 SWEEP(CxDeterminant_head) {
     const KrHandle a = ComplexDefinite(scene);
     const int32_t type = 0;
     KrComplex* det = scene.ComplexNumber();
-    return scene.Call([&] { return CxDeterminant_head(a, &type, det, scene.err()); });
+    return scene.Call(CxDeterminant_head, a, &type, det, scene.err());
 }
 
 SWEEP(Rank_head) {
     const KrHandle a = Definite(scene);
     const double tol = -1.0;
     int32_t* rank = scene.Integer(5);
-    return scene.Call([&] { return Rank_head(a, &tol, rank, scene.err()); });
+    return scene.Call(Rank_head, a, &tol, rank, scene.err());
 }
 
 SWEEP(CxRank_head) {
     const KrHandle a = ComplexDefinite(scene);
     const double tol = -1.0;
     int32_t* rank = scene.Integer(5);
-    return scene.Call([&] { return CxRank_head(a, &tol, rank, scene.err()); });
+    return scene.Call(CxRank_head, a, &tol, rank, scene.err());
 }
 
 SWEEP(Norm_head) {
     const KrHandle a = Definite(scene);
     const int32_t norm_type = 0;
     double* norm = scene.Number();
-    return scene.Call([&] { return Norm_head(a, &norm_type, norm, scene.err()); });
+    return scene.Call(Norm_head, a, &norm_type, norm, scene.err());
 }
 
 SWEEP(CxNorm_head) {
     const KrHandle a = ComplexDefinite(scene);
     const int32_t norm_type = 1;
     double* norm = scene.Number();
-    return scene.Call([&] { return CxNorm_head(a, &norm_type, norm, scene.err()); });
+    return scene.Call(CxNorm_head, a, &norm_type, norm, scene.err());
 }
 
 SWEEP(CondNumber_head) {
     const KrHandle a = Definite(scene);
     const int32_t norm_type = 1;
     double* cond = scene.Number();
-    return scene.Call([&] { return CondNumber_head(a, &norm_type, cond, scene.err()); });
+    return scene.Call(CondNumber_head, a, &norm_type, cond, scene.err());
 }
 
 SWEEP(CxCondNumber_head) {
     const KrHandle a = ComplexDefinite(scene);
     const int32_t norm_type = 3;
     double* cond = scene.Number();
-    return scene.Call([&] { return CxCondNumber_head(a, &norm_type, cond, scene.err()); });
+    return scene.Call(CxCondNumber_head, a, &norm_type, cond, scene.err());
 }
 
 SWEEP(CheckPosdef_head) {
     const KrHandle a = Definite(scene);
     int32_t* flag = scene.Integer(5);
-    return scene.Call([&] { return CheckPosdef_head(a, flag, scene.err()); });
+    return scene.Call(CheckPosdef_head, a, flag, scene.err());
 }
 
 SWEEP(CxCheckPosdef_head) {
     const KrHandle a = ComplexDefinite(scene);
     int32_t* flag = scene.Integer(5);
-    return scene.Call([&] { return CxCheckPosdef_head(a, flag, scene.err()); });
+    return scene.Call(CxCheckPosdef_head, a, flag, scene.err());
 }

@@ -39,7 +39,7 @@ template <class T, class Function>
 int32_t PlayHessenberg(sweep::Scene& scene, Function function) {
     const KrHandle a = First<T>(scene);
     const KrHandle q = OutputMatrix<T>(scene);
-    return scene.Call([&] { return function(a, 0, 2, q); });
+    return scene.Call(function, a, 0, 2, q);
 }
 
 template <class T, class Function>
@@ -48,14 +48,14 @@ int32_t PlayBalance(sweep::Scene& scene, Function function) {
     int32_t* ilo = scene.Integer(-1);
     int32_t* ihi = scene.Integer(-1);
     const KrHandle scale = scene.OutDoubles();
-    return scene.Call([&] { return function(a, 3, ilo, ihi, scale); });
+    return scene.Call(function, a, 3, ilo, ihi, scale);
 }
 
 template <class T, class Function>
 int32_t PlayBack(sweep::Scene& scene, Function function) {
     const KrHandle v = First<T>(scene);
     const KrHandle scale = scene.Doubles({2, 0.5, 1});
-    return scene.Call([&] { return function(v, 3, 0, 0, 1, scale); });
+    return scene.Call(function, v, 3, 0, 0, 1, scale);
 }
 
 template <class T, class Function, class... Order>
@@ -63,7 +63,7 @@ int32_t PlaySchur(sweep::Scene& scene, Function function, Order... order) {
     const KrHandle a = First<T>(scene);
     const KrHandle z = OutputMatrix<T>(scene);
     const KrHandle w = scene.OutComplexes();
-    return scene.Call([&] { return function(a, 1, order..., z, w); });
+    return scene.Call(function, a, 1, order..., z, w);
 }
 
 template <class T, class Function, class... Settings>
@@ -73,7 +73,7 @@ int32_t PlayQZ(sweep::Scene& scene, Function function, Settings... settings) {
     const KrHandle alpha = scene.OutComplexes();
     const KrHandle beta = OutputVector<T>(scene);
     const KrHandle v = scene.OutComplexMatrix();
-    return scene.Call([&] { return function(a, b, settings..., alpha, beta, v); });
+    return scene.Call(function, a, b, settings..., alpha, beta, v);
 }
 
 template <class T, class Function>
@@ -86,7 +86,7 @@ int32_t PlayWholeQZ(sweep::Scene& scene, Function function) {
     const KrHandle beta = OutputVector<T>(scene);
     const KrHandle vr = OutputMatrix<T>(scene);
     const KrHandle vl = OutputMatrix<T>(scene);
-    return scene.Call([&] { return function(a, b, q, z, alpha, beta, 3, vr, vl); });
+    return scene.Call(function, a, b, q, z, alpha, beta, 3, vr, vl);
 }
 
 template <class T, class Function>
@@ -95,7 +95,7 @@ int32_t PlayPencil(sweep::Scene& scene, Function function) {
     const KrHandle b = scene.Replaced(Second<T>(scene), sweep::OnFailure::kOther);
     const KrHandle w = scene.OutComplexes();
     const KrHandle v = scene.OutComplexMatrix();
-    return scene.Call([&] { return function(a, b, 1, w, v); });
+    return scene.Call(function, a, b, 1, w, v);
 }
 
 }  // namespace

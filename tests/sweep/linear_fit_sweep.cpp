@@ -25,7 +25,7 @@ int32_t PlayGeneral(sweep::Scene& scene, Fit fit, int32_t method, int32_t copies
     const KrHandle best_fit = scene.OutDoubles();
     const KrHandle covariance = scene.OutMatrix();
     double* mse = scene.Number();
-    return scene.Call([&] { return fit(h, y, w, method, 1, coef, best_fit, covariance, mse); });
+    return scene.Call(fit, h, y, w, method, 1, coef, best_fit, covariance, mse);
 }
 
 }  // namespace
@@ -37,7 +37,7 @@ SWEEP(LinFit_head) {
     double* slope = scene.Number();
     double* intercept = scene.Number();
     double* mse = scene.Number();
-    return scene.Call([&] { return LinFit_head(y, x, w, slope, intercept, mse); });
+    return scene.Call(LinFit_head, y, x, w, slope, intercept, mse);
 }
 
 SWEEP(LinFitCoef_head) {
@@ -45,7 +45,7 @@ SWEEP(LinFitCoef_head) {
     const KrHandle x = scene.Doubles(kX);
     double* slope = scene.Number();
     double* intercept = scene.Number();
-    return scene.Call([&] { return LinFitCoef_head(y, x, slope, intercept, scene.err()); });
+    return scene.Call(LinFitCoef_head, y, x, slope, intercept, scene.err());
 }
 
 SWEEP(LinFitCoef80_head) {
@@ -54,7 +54,7 @@ SWEEP(LinFitCoef80_head) {
     const KrHandle w = scene.Doubles(kW);
     double* slope = scene.Number();
     double* intercept = scene.Number();
-    return scene.Call([&] { return LinFitCoef80_head(y, x, w, slope, intercept, scene.err()); });
+    return scene.Call(LinFitCoef80_head, y, x, w, slope, intercept, scene.err());
 }
 
 SWEEP(PolyFit_head) {
@@ -63,7 +63,7 @@ SWEEP(PolyFit_head) {
     const KrHandle best_fit = scene.OutDoubles();
     const KrHandle coef = scene.OutDoubles();
     double* mse = scene.Number();
-    return scene.Call([&] { return PolyFit_head(x, y, 2, 3, best_fit, coef, mse); });
+    return scene.Call(PolyFit_head, x, y, 2, 3, best_fit, coef, mse);
 }
 
 SWEEP(PolyFit80_head) {
@@ -74,7 +74,7 @@ SWEEP(PolyFit80_head) {
     const KrHandle best_fit = scene.OutDoubles();
     const KrHandle coef = scene.OutDoubles();
     double* mse = scene.Number();
-    return scene.Call([&] { return PolyFit80_head(x, y, 2, 0, powers, values, best_fit, coef, mse); });
+    return scene.Call(PolyFit80_head, x, y, 2, 0, powers, values, best_fit, coef, mse);
 }
 
 SWEEP(PolyFit81_head) {
@@ -86,7 +86,7 @@ SWEEP(PolyFit81_head) {
     const KrHandle best_fit = scene.OutDoubles();
     const KrHandle coef = scene.OutDoubles();
     double* mse = scene.Number();
-    return scene.Call([&] { return PolyFit81_head(x, y, 2, w, 4, powers, values, best_fit, coef, mse); });
+    return scene.Call(PolyFit81_head, x, y, 2, w, 4, powers, values, best_fit, coef, mse);
 }
 
 SWEEP(GenLSFit_head) {
@@ -113,5 +113,5 @@ SWEEP(GetNewCoef_head) {
     const KrHandle hessian = scene.Matrix(2, 2, {4, 1, 1, 3});
     const KrHandle gradient = scene.Doubles({1, -1});
     const double lambda = 0.5;
-    return scene.Call([&] { return GetNewCoef_head(coef, hessian, gradient, &lambda, scene.err()); });
+    return scene.Call(GetNewCoef_head, coef, hessian, gradient, &lambda, scene.err());
 }

@@ -20,7 +20,7 @@ int32_t SweepFetch(sweep::Scene& scene, int32_t id, int32_t selector) {
     scene.RefusalGives(krnumer::kMeasurementOutOfMemory);
     double* result = scene.Number(sweep::OnFailure::kOther);
     double* box = scene.Numbers(6, sweep::OnFailure::kOther);
-    return scene.Call([&] { return Fetch(id, selector, result, box); });
+    return scene.Call(Fetch, id, selector, result, box);
 }
 
 int32_t NewContext() {
@@ -34,7 +34,7 @@ int32_t NewContext() {
 SWEEP(measurements_create) {
     scene.RefusalGives(krnumer::kMeasurementOutOfMemory);
     uint32_t id = 0;
-    const int32_t status = scene.Call([&] { return measurements_create(&id); });
+    const int32_t status = scene.Call(measurements_create, &id);
     measurements_destroy(static_cast<int32_t>(id));
     return status;
 }
@@ -58,12 +58,12 @@ SWEEP(measurements_clear) {
     double result;
     double box[6];
     Fetch(id, KRN_PERIOD, &result, box);
-    const int32_t status = scene.Call([&] { return measurements_clear(id); });
+    const int32_t status = scene.Call(measurements_clear, id);
     measurements_destroy(id);
     return status;
 }
 
 SWEEP(measurements_destroy) {
     const int32_t id = NewContext();
-    return scene.Call([&] { return measurements_destroy(id); });
+    return scene.Call(measurements_destroy, id);
 }

@@ -14,7 +14,7 @@ int32_t PlayRiffle(sweep::Scene& scene, KrHandle elements, Riffle riffle) {
     // A positive status of the host does not count while the indices are long enough, and these are not.
     const KrHandle indices = scene.OutIntegers();
     KrRandomState state{};
-    return scene.Call([&] { return riffle(x, indices, kSeed, &state); });
+    return scene.Call(riffle, x, indices, kSeed, &state);
 }
 
 }  // namespace
@@ -22,39 +22,39 @@ int32_t PlayRiffle(sweep::Scene& scene, KrHandle elements, Riffle riffle) {
 SWEEP(white) {
     const KrHandle x = scene.OutDoubles();
     KrRandomState state{};
-    return scene.Call([&] { return white(x, &kSamples, &kScale, &kSeed, scene.err(), &state); });
+    return scene.Call(white, x, &kSamples, &kScale, &kSeed, scene.err(), &state);
 }
 
 SWEEP(Gauss) {
     const KrHandle x = scene.OutDoubles();
     KrRandomState state{};
     KrGaussSpare spare{};
-    return scene.Call([&] { return Gauss(x, &kSamples, &kScale, &kSeed, scene.err(), &state, &spare); });
+    return scene.Call(Gauss, x, &kSamples, &kScale, &kSeed, scene.err(), &state, &spare);
 }
 
 SWEEP(PeriodNoise) {
     const KrHandle x = scene.OutDoubles();
     KrRandomState state{};
-    return scene.Call([&] { return PeriodNoise(&kSamples, &kScale, &kSeed, x, scene.err(), &state); });
+    return scene.Call(PeriodNoise, &kSamples, &kScale, &kSeed, x, scene.err(), &state);
 }
 
 SWEEP(BinomialNoiseH) {
     const KrHandle x = scene.OutIntegers();
     KrRandomState state{};
     KrBinomialCache cache{};
-    return scene.Call([&] { return BinomialNoiseH(x, kSamples, 100, 0.4, kSeed, &state, &cache); });
+    return scene.Call(BinomialNoiseH, x, kSamples, 100, 0.4, kSeed, &state, &cache);
 }
 
 SWEEP(GammaNoiseH) {
     const KrHandle x = scene.OutDoubles();
     KrRandomState state{};
-    return scene.Call([&] { return GammaNoiseH(x, kSamples, 7, kSeed, &state); });
+    return scene.Call(GammaNoiseH, x, kSamples, 7, kSeed, &state);
 }
 
 SWEEP(PoissonNoiseH) {
     const KrHandle x = scene.OutDoubles();
     KrRandomState state{};
-    return scene.Call([&] { return PoissonNoiseH(x, kSamples, 20.0, kSeed, &state); });
+    return scene.Call(PoissonNoiseH, x, kSamples, 20.0, kSeed, &state);
 }
 
 SWEEP(RiffleArrayDBL_head) {
@@ -70,5 +70,5 @@ SWEEP(RiffleArrayInt_head) {
 SWEEP(RiffleIntNum_head) {
     const KrHandle x = scene.OutIntegers();
     KrRandomState state{};
-    return scene.Call([&] { return RiffleIntNum_head(x, kSamples, kSeed, &state); });
+    return scene.Call(RiffleIntNum_head, x, kSamples, kSeed, &state);
 }

@@ -17,7 +17,7 @@ SWEEP(ExpFit_head) {
     double* a = scene.Number();
     double* b = scene.Number();
     double* mse = scene.Number();
-    return scene.Call([&] { return ExpFit_head(y, x, sigma, a, b, mse); });
+    return scene.Call(ExpFit_head, y, x, sigma, a, b, mse);
 }
 
 SWEEP(ExpFit80_head) {
@@ -29,7 +29,7 @@ SWEEP(ExpFit80_head) {
     double* b = scene.Number();
     double* mse = scene.Number();
     int32_t* iter = scene.Integer(20);
-    return scene.Call([&] { return ExpFit80_head(y, x, w, 0.0, init, 1, a, b, mse, iter, 0.0); });
+    return scene.Call(ExpFit80_head, y, x, w, 0.0, init, 1, a, b, mse, iter, 0.0);
 }
 
 SWEEP(ExpFitCoef_head) {
@@ -37,7 +37,7 @@ SWEEP(ExpFitCoef_head) {
     const KrHandle x = scene.Doubles(kX);
     double* a = scene.Number();
     double* b = scene.Number();
-    return scene.Call([&] { return ExpFitCoef_head(y, x, a, b); });
+    return scene.Call(ExpFitCoef_head, y, x, a, b);
 }
 
 SWEEP(ExpFitCoef80_head) {
@@ -48,7 +48,7 @@ SWEEP(ExpFitCoef80_head) {
     double* a = scene.Number();
     double* b = scene.Number();
     int32_t* iter = scene.Integer(20);
-    return scene.Call([&] { return ExpFitCoef80_head(y, x, w, 1, 0.0, init, a, b, iter, 0.0); });
+    return scene.Call(ExpFitCoef80_head, y, x, w, 1, 0.0, init, a, b, iter, 0.0);
 }
 
 SWEEP(PowerFit_head) {
@@ -60,7 +60,7 @@ SWEEP(PowerFit_head) {
     double* b = scene.Number();
     double* mse = scene.Number();
     int32_t* iter = scene.Integer(20);
-    return scene.Call([&] { return PowerFit_head(y, x, w, 0.0, init, a, b, mse, iter, 0.0); });
+    return scene.Call(PowerFit_head, y, x, w, 0.0, init, a, b, mse, iter, 0.0);
 }
 
 SWEEP(PowerFitCoef_head) {
@@ -71,7 +71,7 @@ SWEEP(PowerFitCoef_head) {
     double* a = scene.Number();
     double* b = scene.Number();
     int32_t* iter = scene.Integer(20);
-    return scene.Call([&] { return PowerFitCoef_head(y, x, w, 0.0, init, a, b, iter, 0.0); });
+    return scene.Call(PowerFitCoef_head, y, x, w, 0.0, init, a, b, iter, 0.0);
 }
 
 SWEEP(LogFit_head) {
@@ -81,7 +81,7 @@ SWEEP(LogFit_head) {
     double* a = scene.Number();
     double* b = scene.Number();
     double* mse = scene.Number();
-    return scene.Call([&] { return LogFit_head(y, x, w, 10.0, a, b, mse); });
+    return scene.Call(LogFit_head, y, x, w, 10.0, a, b, mse);
 }
 
 SWEEP(LogFitCoef_head) {
@@ -90,7 +90,7 @@ SWEEP(LogFitCoef_head) {
     const KrHandle w = scene.Doubles(kW);
     double* a = scene.Number();
     double* b = scene.Number();
-    return scene.Call([&] { return LogFitCoef_head(y, x, w, 10.0, a, b); });
+    return scene.Call(LogFitCoef_head, y, x, w, 10.0, a, b);
 }
 
 SWEEP(GaussianPeakFit_head) {
@@ -103,7 +103,7 @@ SWEEP(GaussianPeakFit_head) {
     double* sigma = scene.Number();
     double* mse = scene.Number();
     int32_t* iter = scene.Integer(20);
-    return scene.Call([&] { return GaussianPeakFit_head(y, x, w, 0.0, init, a, mu, sigma, mse, iter, 0.0); });
+    return scene.Call(GaussianPeakFit_head, y, x, w, 0.0, init, a, mu, sigma, mse, iter, 0.0);
 }
 
 SWEEP(GaussianPeakFitCoef_head) {
@@ -115,5 +115,5 @@ SWEEP(GaussianPeakFitCoef_head) {
     double* mu = scene.Number();
     double* sigma = scene.Number();
     int32_t* iter = scene.Integer(20);
-    return scene.Call([&] { return GaussianPeakFitCoef_head(y, x, w, 0.0, init, a, mu, sigma, iter, 0.0); });
+    return scene.Call(GaussianPeakFitCoef_head, y, x, w, 0.0, init, a, mu, sigma, iter, 0.0);
 }

@@ -31,7 +31,7 @@ int32_t Detect(sweep::Scene& scene, int32_t flags) {
         PeakD(&former, &state, &work, &err);
     }
     record.flags = flags;
-    const int32_t status = scene.Call([&] { return PeakD(&record, &state, &work, scene.err()); });
+    const int32_t status = scene.Call(PeakD, &record, &state, &work, scene.err());
     DropBlock(work);
     return status;
 }
@@ -56,5 +56,5 @@ SWEEP(PeakDetector) {
     const int32_t width = 2;
     const KrHandle indices = scene.OutIntegers();
     int32_t* count = scene.Integer(-7);
-    return scene.Call([&] { return PeakDetector(x, &threshold, &width, indices, count, scene.err()); });
+    return scene.Call(PeakDetector, x, &threshold, &width, indices, count, scene.err());
 }

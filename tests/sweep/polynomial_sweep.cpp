@@ -5,13 +5,13 @@
 SWEEP(PolyEv) {
     const KrHandle x = scene.Replaced(scene.Doubles({1, 2, 3}));
     const KrHandle coef = scene.Doubles({1, -2, 0.5});
-    return scene.Call([&] { return PolyEv(x, coef, scene.err()); });
+    return scene.Call(PolyEv, x, coef, scene.err());
 }
 
 SWEEP(EvPoly2D) {
     const KrHandle x = scene.Replaced(scene.Matrix(2, 2, {1, 2, 3, 4}));
     const KrHandle coef = scene.Doubles({1, -2, 0.5});
-    return scene.Call([&] { return EvPoly2D(x, coef, scene.err()); });
+    return scene.Call(EvPoly2D, x, coef, scene.err());
 }
 
 SWEEP(PolyRootsNtBst_head) {
@@ -19,13 +19,13 @@ SWEEP(PolyRootsNtBst_head) {
     const KrHandle guesses = scene.Doubles({1.5});
     const KrHandle pairs = scene.Complexes({{1, 1}, {1, -1}, {2, 0}});
     const KrHandle roots = scene.OutComplexes();
-    return scene.Call([&] { return PolyRootsNtBst_head(coef, guesses, 20, 1e-12, pairs, 20, 1e-12, roots); });
+    return scene.Call(PolyRootsNtBst_head, coef, guesses, 20, 1e-12, pairs, 20, 1e-12, roots);
 }
 
 SWEEP(CxPolyRoots_head) {
     const KrHandle coef = scene.Replaced(scene.Complexes({{0, 0}, {24, 2}, {-50, 1}, {35, 0}, {-10, -3}, {1, 0}}));
     const int32_t limit = 20;
-    return scene.Call([&] { return CxPolyRoots_head(coef, &limit, scene.err()); });
+    return scene.Call(CxPolyRoots_head, coef, &limit, scene.err());
 }
 
 SWEEP(MultPolyRoots_head) {
@@ -33,7 +33,7 @@ SWEEP(MultPolyRoots_head) {
     const KrHandle roots = scene.OutComplexes();
     const KrHandle distinct = scene.OutComplexes();
     const KrHandle mult = scene.OutIntegers();
-    return scene.Call([&] { return MultPolyRoots_head(coef, 1, -1.0, roots, distinct, mult); });
+    return scene.Call(MultPolyRoots_head, coef, 1, -1.0, roots, distinct, mult);
 }
 
 SWEEP(MultPolyRoots_head_first_stage) {
@@ -41,7 +41,7 @@ SWEEP(MultPolyRoots_head_first_stage) {
     const KrHandle roots = scene.OutComplexes();
     const KrHandle distinct = scene.OutComplexes();
     const KrHandle mult = scene.OutIntegers();
-    return scene.Call([&] { return MultPolyRoots_head(coef, 0, -1.0, roots, distinct, mult); });
+    return scene.Call(MultPolyRoots_head, coef, 0, -1.0, roots, distinct, mult);
 }
 
 SWEEP(CxMultPolyRoots_head) {
@@ -49,7 +49,7 @@ SWEEP(CxMultPolyRoots_head) {
     const KrHandle roots = scene.OutComplexes();
     const KrHandle distinct = scene.OutComplexes();
     const KrHandle mult = scene.OutIntegers();
-    return scene.Call([&] { return CxMultPolyRoots_head(coef, 1, -1.0, roots, distinct, mult); });
+    return scene.Call(CxMultPolyRoots_head, coef, 1, -1.0, roots, distinct, mult);
 }
 
 SWEEP(PolyGCD_H) {
@@ -58,7 +58,7 @@ SWEEP(PolyGCD_H) {
     const KrHandle gcd = scene.OutDoubles();
     const KrHandle u = scene.OutDoubles();
     const KrHandle v = scene.OutDoubles();
-    return scene.Call([&] { return PolyGCD_H(p, q, -1.0, gcd, u, v, 1); });
+    return scene.Call(PolyGCD_H, p, q, -1.0, gcd, u, v, 1);
 }
 
 SWEEP(CxPolyGCD_H) {
@@ -67,5 +67,5 @@ SWEEP(CxPolyGCD_H) {
     const KrHandle gcd = scene.OutComplexes();
     const KrHandle u = scene.OutComplexes();
     const KrHandle v = scene.OutComplexes();
-    return scene.Call([&] { return CxPolyGCD_H(p, q, -1.0, gcd, u, v, 1); });
+    return scene.Call(CxPolyGCD_H, p, q, -1.0, gcd, u, v, 1);
 }

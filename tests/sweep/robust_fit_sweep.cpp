@@ -19,7 +19,7 @@ SWEEP(BiExpFit_head) {
     double* b = scene.Number();
     double* residue = scene.Number();
     int32_t* iter = scene.Integer(5);
-    return scene.Call([&] { return BiExpFit_head(y, x, w, 0.0, init, 1, a, b, residue, iter, 0.0, 0); });
+    return scene.Call(BiExpFit_head, y, x, w, 0.0, init, 1, a, b, residue, iter, 0.0, 0);
 }
 
 SWEEP(BiPowerFit_head) {
@@ -31,7 +31,7 @@ SWEEP(BiPowerFit_head) {
     double* b = scene.Number();
     double* residue = scene.Number();
     int32_t* iter = scene.Integer(5);
-    return scene.Call([&] { return BiPowerFit_head(y, x, w, 0.0, init, a, b, residue, iter, 0.0, 0); });
+    return scene.Call(BiPowerFit_head, y, x, w, 0.0, init, a, b, residue, iter, 0.0, 0);
 }
 
 SWEEP(BiGaussFit_head) {
@@ -44,7 +44,7 @@ SWEEP(BiGaussFit_head) {
     double* sigma = scene.Number();
     double* residue = scene.Number();
     int32_t* iter = scene.Integer(5);
-    return scene.Call([&] { return BiGaussFit_head(y, x, w, 0.0, init, a, mu, sigma, residue, iter, 0.0, 0); });
+    return scene.Call(BiGaussFit_head, y, x, w, 0.0, init, a, mu, sigma, residue, iter, 0.0, 0);
 }
 
 SWEEP(BiLinearFit_head) {
@@ -55,7 +55,7 @@ SWEEP(BiLinearFit_head) {
     double* intercept = scene.Number();
     double* residue = scene.Number();
     int32_t* iter = scene.Integer(5);
-    return scene.Call([&] { return BiLinearFit_head(y, x, w, 0.0, slope, intercept, residue, iter, 0); });
+    return scene.Call(BiLinearFit_head, y, x, w, 0.0, slope, intercept, residue, iter, 0);
 }
 
 SWEEP(BiLogFit_head) {
@@ -66,7 +66,7 @@ SWEEP(BiLogFit_head) {
     double* b = scene.Number();
     double* residue = scene.Number();
     int32_t* iter = scene.Integer(5);
-    return scene.Call([&] { return BiLogFit_head(y, x, w, 10.0, 0.0, a, b, residue, iter, 0); });
+    return scene.Call(BiLogFit_head, y, x, w, 10.0, 0.0, a, b, residue, iter, 0);
 }
 
 SWEEP(LARExpFit_head) {
@@ -78,7 +78,7 @@ SWEEP(LARExpFit_head) {
     double* b = scene.Number();
     double* residue = scene.Number();
     int32_t* iter = scene.Integer(5);
-    return scene.Call([&] { return LARExpFit_head(y, x, w, 0.0, init, 1, a, b, residue, iter, 0.0, 0); });
+    return scene.Call(LARExpFit_head, y, x, w, 0.0, init, 1, a, b, residue, iter, 0.0, 0);
 }
 
 SWEEP(LARPowerFit_head) {
@@ -90,7 +90,7 @@ SWEEP(LARPowerFit_head) {
     double* b = scene.Number();
     double* residue = scene.Number();
     int32_t* iter = scene.Integer(5);
-    return scene.Call([&] { return LARPowerFit_head(y, x, w, 0.0, init, a, b, residue, iter, 0.0, 0); });
+    return scene.Call(LARPowerFit_head, y, x, w, 0.0, init, a, b, residue, iter, 0.0, 0);
 }
 
 SWEEP(LARGaussFit_head) {
@@ -103,7 +103,7 @@ SWEEP(LARGaussFit_head) {
     double* sigma = scene.Number();
     double* residue = scene.Number();
     int32_t* iter = scene.Integer(5);
-    return scene.Call([&] { return LARGaussFit_head(y, x, w, 0.0, init, a, mu, sigma, residue, iter, 0.0, 0); });
+    return scene.Call(LARGaussFit_head, y, x, w, 0.0, init, a, mu, sigma, residue, iter, 0.0, 0);
 }
 
 SWEEP(LARLinearFit_head) {
@@ -114,7 +114,7 @@ SWEEP(LARLinearFit_head) {
     double* intercept = scene.Number();
     double* residue = scene.Number();
     int32_t* iter = scene.Integer(5);
-    return scene.Call([&] { return LARLinearFit_head(y, x, w, 0.0, slope, intercept, residue, iter, 0.0, 0); });
+    return scene.Call(LARLinearFit_head, y, x, w, 0.0, slope, intercept, residue, iter, 0.0, 0);
 }
 
 SWEEP(LARLogFit_head) {
@@ -125,5 +125,5 @@ SWEEP(LARLogFit_head) {
     double* b = scene.Number();
     double* residue = scene.Number();
     int32_t* iter = scene.Integer(5);
-    return scene.Call([&] { return LARLogFit_head(y, x, w, 10.0, 0.0, a, b, residue, iter, 0.0, 0); });
+    return scene.Call(LARLogFit_head, y, x, w, 10.0, 0.0, a, b, residue, iter, 0.0, 0);
 }

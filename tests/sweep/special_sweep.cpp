@@ -8,10 +8,7 @@ namespace {
 template <class... Parameters, class... Arguments>
 int32_t Plain(sweep::Scene& scene, void (*function)(Parameters...), Arguments... arguments) {
     double* const out = scene.Number();
-    return scene.Call([&] {
-        function(arguments..., out);
-        return 0;
-    });
+    return scene.Call(function, arguments..., out);
 }
 
 }  // namespace
@@ -52,10 +49,7 @@ SWEEP(KR_Dawson) {
 }
 SWEEP(KR_FresnelIntegrals) {
     double* const values = scene.Numbers(2);
-    return scene.Call([&] {
-        KR_FresnelIntegrals(3.0, values, values + 1);
-        return 0;
-    });
+    return scene.Call(KR_FresnelIntegrals, 3.0, values, values + 1);
 }
 SWEEP(KR_ExpI) {
     return Plain(scene, KR_ExpI, 0.5, 3);
@@ -81,10 +75,7 @@ SWEEP(KR_Elliptic2) {
 }
 SWEEP(KR_EllipticJ) {
     double* const values = scene.Numbers(4);
-    return scene.Call([&] {
-        KR_EllipticJ(1.5, 0.6, values, values + 1, values + 2, values + 3);
-        return 0;
-    });
+    return scene.Call(KR_EllipticJ, 1.5, 0.6, values, values + 1, values + 2, values + 3);
 }
 SWEEP(KR_Gauss) {
     return Plain(scene, KR_Gauss, 0.95, 1.3, 0.7, 2.6);
@@ -125,24 +116,15 @@ SWEEP(KR_BesselKn) {
 }
 SWEEP(KR_KelvinI) {
     double* const values = scene.Numbers(2);
-    return scene.Call([&] {
-        KR_KelvinI(2.0, 3, values, values + 1);
-        return 0;
-    });
+    return scene.Call(KR_KelvinI, 2.0, 3, values, values + 1);
 }
 SWEEP(KR_KelvinK) {
     double* const values = scene.Numbers(2);
-    return scene.Call([&] {
-        KR_KelvinK(2.0, 3, values, values + 1);
-        return 0;
-    });
+    return scene.Call(KR_KelvinK, 2.0, 3, values, values + 1);
 }
 SWEEP(KR_Airy) {
     double* const values = scene.Numbers(4);
-    return scene.Call([&] {
-        KR_Airy(5.0, values, values + 1, values + 2, values + 3);
-        return 0;
-    });
+    return scene.Call(KR_Airy, 5.0, values, values + 1, values + 2, values + 3);
 }
 SWEEP(KR_Struve) {
     return Plain(scene, KR_Struve, 25.0, 0.0);

@@ -1,6 +1,7 @@
 #include "sweep/sweep.h"
 
 #include <bit>
+#include <cmath>
 #include <cstdio>
 #include <cstring>
 
@@ -11,17 +12,12 @@ namespace {
 
 constexpr double kGarbage = -123.456;
 
-int32_t ElementBytes(int32_t type_code) {
-    switch (type_code) {
-        case KRRT_UINT8:
-            return 1;
-        case KRRT_DOUBLE:
-            return 8;
-        case KRRT_COMPLEX:
-            return 16;
-        default:
-            return 4;
-    }
+constexpr int32_t kRecords = 0;  // in place of a type code
+
+uint64_t Product(const std::vector<int32_t>& dimensions) {
+    uint64_t product = 1;
+    for (const int32_t dimension : dimensions) product *= static_cast<uint64_t>(dimension);
+    return product;
 }
 
 std::string Hexadecimal(const void* bytes, uint64_t count) {
@@ -47,23 +43,44 @@ Scene::~Scene() {
     for (const int32_t* integer : integers_) delete integer;
 }
 
-KrHandle Scene::NewArray(int32_t type_code, std::initializer_list<int32_t> dimensions, const void* elements) {
-    const int32_t* d = dimensions.begin();
-    uint64_t count = 1;
-    for (const int32_t dimension : dimensions) count *= static_cast<uint64_t>(dimension);
-    const KrHandle handle = dimensions.size() == 1   ? KrrtNewArray(type_code, d[0])
-                            : dimensions.size() == 2 ? KrrtNewMatrix(type_code, d[0], d[1])
-                                                     : KrrtNewCube(type_code, d[0], d[1], d[2]);
-    if (count > 0) std::memcpy(KrrtElements(handle), elements, count * static_cast<uint64_t>(ElementBytes(type_code)));
-    arrays_.push_back({handle, false, OnFailure::kOther});
+KrHandle Scene::NewArray(int32_t type_code, std::vector<int32_t> dimensions, const void* elements) {
+    uint64_t count = Product(dimensions);
+    std::vector<char> varied;
+    if (variation_ != nullptr) {
+        const uint64_t original = count;
+        variation_->Resize(&dimensions);
+        count = Product(dimensions);
+        varied = variation_->Elements(type_code, elements, original, count);
+        elements = varied.data();
+    }
+    const std::vector<int32_t>& d = dimensions;
+    const KrHandle handle = d.size() == 1   ? KrrtNewArray(type_code, d[0])
+                            : d.size() == 2 ? KrrtNewMatrix(type_code, d[0], d[1])
+                                            : KrrtNewCube(type_code, d[0], d[1], d[2]);
+    if (count > 0) std::memcpy(KrrtElements(handle), elements, count * ElementBytes(type_code));
+    arrays_.push_back({handle, type_code, false, OnFailure::kOther});
     return handle;
 }
 
 KrHandle Scene::NewRecords(int32_t bytes, int32_t count, const void* elements) {
     const KrHandle handle = KrrtNewRecords(bytes, count);
     if (count > 0) std::memcpy(KrrtElements(handle), elements, static_cast<size_t>(bytes) * static_cast<size_t>(count));
-    arrays_.push_back({handle, false, OnFailure::kOther});
+    arrays_.push_back({handle, kRecords, false, OnFailure::kOther});
     return handle;
+}
+
+KrHandle Scene::Alias(KrHandle handle) {
+    const auto same_kind = [this](KrHandle a, KrHandle b) {
+        int32_t code[2] = {kRecords, kRecords};
+        for (const Array& array : arrays_) {
+            if (array.handle == a) code[0] = array.type_code;
+            if (array.handle == b) code[1] = array.type_code;
+        }
+        return code[0] != kRecords && code[0] == code[1] && KrrtRank(a) == KrrtRank(b);
+    };
+    const size_t other = variation_->Choice(arrays_.size() + 1);
+    if (other == 0 || !same_kind(handle, arrays_[other - 1].handle)) return handle;
+    return arrays_[other - 1].handle;
 }
 
 KrHandle Scene::NewOutput(int32_t type_code, int rank, OnFailure on_failure) {
@@ -75,7 +92,7 @@ KrHandle Scene::NewOutput(int32_t type_code, int rank, OnFailure on_failure) {
 
 KrHandle Scene::Replaced(KrHandle input, OnFailure on_failure) {
     for (Array& array : arrays_)
-        if (array.handle == input) array = {input, true, on_failure};
+        if (array.handle == input) array = {input, array.type_code, true, on_failure};
     return input;
 }
 
@@ -129,11 +146,13 @@ double* Scene::Numbers(int32_t count, OnFailure on_failure) {
 }
 
 double* Scene::State(double value) {
+    if (variation_ != nullptr) value = variation_->Of(value);
     scalars_.push_back(new Scalars{{value}, false, OnFailure::kOther});
     return scalars_.back()->values.data();
 }
 
 int32_t* Scene::Integer(int32_t value) {
+    if (variation_ != nullptr) value = variation_->Of(value);
     integers_.push_back(new int32_t{value});
     return integers_.back();
 }
@@ -144,16 +163,26 @@ int32_t* Scene::err() {
 }
 
 std::string Scene::Results() const {
+    // To the bit; only under variation is one NaN as good as another, for an operation on two NaN may give either.
+    const auto Numbers = [this](const void* elements, uint64_t bytes) {
+        std::vector<double> values(bytes / sizeof(double));
+        if (!values.empty()) std::memcpy(values.data(), elements, bytes);
+        for (double& value : values)
+            if (variation_ != nullptr && std::isnan(value)) value = krnumer::kQuietNaN;
+        return Hexadecimal(values.data(), bytes);
+    };
     std::string text = std::to_string(status_);
     for (const Array& array : arrays_) {
         text += "; ";
         for (int32_t axis = 0; axis < KrrtRank(array.handle); ++axis)
             text += std::to_string(KrrtSize(array.handle, axis)) + " ";
         const uint64_t words = 4 * static_cast<uint64_t>(KrrtRank(array.handle));
-        text += Hexadecimal(KrrtElements(array.handle), KrrtBytes(array.handle) - words);
+        const uint64_t bytes = KrrtBytes(array.handle) - words;
+        const bool doubles = array.type_code == KRRT_DOUBLE || array.type_code == KRRT_COMPLEX;
+        text += doubles ? Numbers(KrrtElements(array.handle), bytes) : Hexadecimal(KrrtElements(array.handle), bytes);
     }
     for (const Scalars* scalars : scalars_)
-        text += "; " + Hexadecimal(scalars->values.data(), scalars->values.size() * sizeof(double));
+        text += "; " + Numbers(scalars->values.data(), scalars->values.size() * sizeof(double));
     for (const int32_t* integer : integers_) text += "; " + std::to_string(*integer);
     return text;
 }

@@ -7,24 +7,28 @@
 //         const int32_t bins = 2;
 //         const KrHandle histogram = scene.OutIntegers();
 //         const KrHandle centers = scene.OutDoubles();
-//         return scene.Call([&] { return histgran_head(x, &bins, histogram, centers, scene.err()); });
+//         return scene.Call(histgran_head, x, &bins, histogram, centers, scene.err());
 //     }
 //
 // The sweep plays it: with both alignments of elements and with blocks that move at every resize, expecting the same
 // results to the bit; with each resize failing in turn and each allocation failing in turn, expecting a clear status
 // and outputs in their failure state; with garbage in *err and in the outputs beforehand. It leaves no block of the
-// host and no memory behind.
+// host and no memory behind. The fuzzer plays the same scenes with varied arguments.
 #pragma once
 
+#include <array>
 #include <cstdint>
-#include <initializer_list>
+#include <memory>
 #include <string>
+#include <tuple>
+#include <type_traits>
 #include <vector>
 
 #include "frame/complex.h"
 #include "frame/status.h"
 #include "krrt/krrt.h"
 #include "sweep/allocator.h"
+#include "sweep/variation.h"
 
 namespace sweep {
 
@@ -37,6 +41,7 @@ enum class OnFailure {
 class Scene {
   public:
     explicit Scene(int32_t refused_allocation = 0) : refused_allocation_(refused_allocation) {}
+    explicit Scene(Variation* variation) : variation_(variation) {}
     ~Scene();
     Scene(const Scene&) = delete;
     Scene& operator=(const Scene&) = delete;
@@ -91,7 +96,21 @@ class Scene {
     // A refused resize is no failure of the call, which does without.
     void SurvivesRefusedResize() { survives_resize_ = true; }
 
-    // Makes the call, under the pressure of this pass.
+    // Calls the export, under the pressure of this pass.
+    template <class Return, class... Parameters, class... Arguments>
+    int32_t Call(Return (*function)(Parameters...), Arguments&&... arguments) {
+        std::tuple<Parameters...> varied{Varied<Parameters>(arguments)...};
+        return Call([&] {
+            if constexpr (std::is_void_v<Return>) {
+                std::apply(function, varied);
+                return krnumer::kOk;
+            } else {
+                return std::apply(function, varied);
+            }
+        });
+    }
+
+    // Makes several calls that belong together.
     template <class Function>
     int32_t Call(Function&& function) {
         int32_t result;
@@ -119,6 +138,7 @@ class Scene {
   private:
     struct Array {
         KrHandle handle;
+        int32_t type_code;
         bool output;
         OnFailure on_failure;
     };
@@ -128,20 +148,48 @@ class Scene {
         OnFailure on_failure;
     };
 
-    KrHandle NewArray(int32_t type_code, std::initializer_list<int32_t> dimensions, const void* elements);
+    // The argument as the function is to see it. Constants behind pointers are varied as copies, arrays of them whole.
+    template <class Parameter, class Argument>
+    Parameter Varied(Argument& argument) {
+        using Pointee = std::remove_pointer_t<Parameter>;
+        if constexpr (std::is_same_v<Parameter, KrHandle>) {
+            return variation_ == nullptr ? KrHandle{argument} : Alias(argument);
+        } else if constexpr (std::is_arithmetic_v<Parameter>) {
+            const auto value = static_cast<Parameter>(argument);
+            return variation_ == nullptr ? value : variation_->Of(value);
+        } else if constexpr (std::is_const_v<Pointee> && std::is_arithmetic_v<Pointee>) {
+            if (variation_ == nullptr) return argument;
+            using Value = std::remove_const_t<Pointee>;
+            constexpr size_t kCount = std::is_array_v<Argument> ? std::extent_v<Argument> : 1;
+            const auto copies = std::make_shared<std::array<Value, kCount>>();
+            const Pointee* values = argument;
+            if (values == nullptr) return nullptr;
+            for (Value& copy : *copies) copy = variation_->Of(*values++);
+            kept_.push_back(copies);
+            return copies->data();
+        } else {
+            return argument;
+        }
+    }
+    // Now and then another array of the kind, so that the call meets one array twice.
+    KrHandle Alias(KrHandle handle);
+
+    KrHandle NewArray(int32_t type_code, std::vector<int32_t> dimensions, const void* elements);
     KrHandle NewRecords(int32_t bytes, int32_t count, const void* elements);
     KrHandle NewOutput(int32_t type_code, int rank, OnFailure on_failure);
 
     std::vector<Array> arrays_;
     std::vector<Scalars*> scalars_;
     std::vector<int32_t*> integers_;
+    std::vector<std::shared_ptr<void>> kept_;
     int32_t err_ = 0x5A5A5A5A;
     bool err_asked_ = false;
     bool survives_refusal_ = false;
     bool survives_resize_ = false;
     int32_t undisturbed_status_ = krnumer::kOk;  // or a warning
     int32_t refusal_status_ = krnumer::kOutOfMemory;
-    int32_t refused_allocation_;
+    int32_t refused_allocation_ = 0;
+    Variation* variation_ = nullptr;  // null: arguments as the scene gives them
     int32_t result_ = 0;
     int32_t status_ = 0;
 };

@@ -11,7 +11,7 @@ template <class Transform>
 int32_t PlayInPlace(sweep::Scene& scene, Transform transform) {
     const KrHandle x = scene.Replaced(scene.Doubles(kReal));
     void* slot = nullptr;
-    return scene.Call([&] { return transform(x, &slot); });
+    return scene.Call(transform, x, &slot);
 }
 
 template <class Transform>
@@ -19,7 +19,7 @@ int32_t PlayForward(sweep::Scene& scene, Transform transform) {
     const KrHandle x = scene.Doubles(kReal);
     const KrHandle y = scene.OutDoubles(sweep::OnFailure::kOther);
     void* slot = nullptr;
-    return scene.Call([&] { return transform(x, y, 7, &slot); });
+    return scene.Call(transform, x, y, 7, &slot);
 }
 
 template <class Transform>
@@ -27,7 +27,7 @@ int32_t PlayInverse(sweep::Scene& scene, Transform transform) {
     const KrHandle x = scene.Doubles(kReal);
     const KrHandle y = scene.OutDoubles();
     void* slot = nullptr;
-    return scene.Call([&] { return transform(x, y, &slot); });
+    return scene.Call(transform, x, y, &slot);
 }
 
 template <class Transform>
@@ -35,7 +35,7 @@ int32_t PlayForwardMatrix(sweep::Scene& scene, Transform transform) {
     const KrHandle x = scene.Matrix(2, 3, kReal);
     const KrHandle y = scene.OutMatrix();
     void* slots[2] = {};
-    return scene.Call([&] { return transform(x, y, 3, 0, &slots[0], &slots[1]); });
+    return scene.Call(transform, x, y, 3, 0, &slots[0], &slots[1]);
 }
 
 template <class Transform>
@@ -43,7 +43,7 @@ int32_t PlayInverseMatrix(sweep::Scene& scene, Transform transform) {
     const KrHandle x = scene.Matrix(2, 3, kReal);
     const KrHandle y = scene.OutMatrix();
     void* slots[2] = {};
-    return scene.Call([&] { return transform(x, y, &slots[0], &slots[1]); });
+    return scene.Call(transform, x, y, &slots[0], &slots[1]);
 }
 
 }  // namespace
@@ -92,7 +92,7 @@ SWEEP(CxSpectrumH) {
     const KrHandle x = scene.Complexes(kComplex);
     const KrHandle y = scene.OutDoubles();
     void* slot = nullptr;
-    return scene.Call([&] { return CxSpectrumH(x, y, &slot); });
+    return scene.Call(CxSpectrumH, x, y, &slot);
 }
 
 SWEEP(CrossSpectrumH) {
@@ -100,7 +100,7 @@ SWEEP(CrossSpectrumH) {
     const KrHandle y = scene.Doubles({2, 0, 1, -1, 3, 2});
     const KrHandle z = scene.OutComplexes();
     void* slot = nullptr;
-    return scene.Call([&] { return CrossSpectrumH(x, y, z, &slot); });
+    return scene.Call(CrossSpectrumH, x, y, z, &slot);
 }
 
 SWEEP(CxCrossSpectrumH) {
@@ -108,7 +108,7 @@ SWEEP(CxCrossSpectrumH) {
     const KrHandle y = scene.Complexes({{2, 0}, {1, -1}, {3, 2}, {0, 1}, {1, 1}});
     const KrHandle z = scene.OutComplexes();
     void* slot = nullptr;
-    return scene.Call([&] { return CxCrossSpectrumH(x, y, z, &slot); });
+    return scene.Call(CxCrossSpectrumH, x, y, z, &slot);
 }
 
 SWEEP(ReCascadedMovingAverageH) {
@@ -117,7 +117,7 @@ SWEEP(ReCascadedMovingAverageH) {
     const KrHandle sums = scene.OutDoubles(sweep::OnFailure::kOther);
     const KrHandle history = scene.OutMatrix(sweep::OnFailure::kOther);
     int32_t* index = scene.Integer(0);
-    return scene.Call([&] { return ReCascadedMovingAverageH(x, 2, 3, sums, history, index, 1); });
+    return scene.Call(ReCascadedMovingAverageH, x, 2, 3, sums, history, index, 1);
 }
 
 SWEEP(CxCascadedMovingAverageH) {
@@ -126,7 +126,7 @@ SWEEP(CxCascadedMovingAverageH) {
     const KrHandle sums = scene.OutComplexes(sweep::OnFailure::kOther);
     const KrHandle history = scene.OutComplexMatrix(sweep::OnFailure::kOther);
     int32_t* index = scene.Integer(0);
-    return scene.Call([&] { return CxCascadedMovingAverageH(x, 2, 3, sums, history, index, 1); });
+    return scene.Call(CxCascadedMovingAverageH, x, 2, 3, sums, history, index, 1);
 }
 
 SWEEP(ReDecimatedMovingAverageH) {
@@ -134,7 +134,7 @@ SWEEP(ReDecimatedMovingAverageH) {
     double* sum = scene.State(1.5);
     int32_t* count = scene.Integer(2);
     int32_t* out_count = scene.Integer(-1);
-    return scene.Call([&] { return ReDecimatedMovingAverageH(x, 3, sum, count, 0, out_count); });
+    return scene.Call(ReDecimatedMovingAverageH, x, 3, sum, count, 0, out_count);
 }
 
 SWEEP(CxDecimatedMovingAverageH) {
@@ -142,7 +142,7 @@ SWEEP(CxDecimatedMovingAverageH) {
     KrComplex sum{1.5, -2};
     int32_t* count = scene.Integer(2);
     int32_t* out_count = scene.Integer(-1);
-    return scene.Call([&] { return CxDecimatedMovingAverageH(x, 3, &sum, count, 0, out_count); });
+    return scene.Call(CxDecimatedMovingAverageH, x, 3, &sum, count, 0, out_count);
 }
 
 SWEEP(ReComplexModulatorH) {
@@ -150,11 +150,11 @@ SWEEP(ReComplexModulatorH) {
     const KrHandle x = scene.Doubles(kReal);
     double* phase = scene.State(0.25);
     const KrHandle y = scene.OutComplexes();
-    return scene.Call([&] { return ReComplexModulatorH(x, 3.0, 10.0, phase, y); });
+    return scene.Call(ReComplexModulatorH, x, 3.0, 10.0, phase, y);
 }
 
 SWEEP(CxComplexModulatorH) {
     const KrHandle x = scene.Replaced(scene.Complexes(kComplex));
     double* phase = scene.State(0.25);
-    return scene.Call([&] { return CxComplexModulatorH(x, 3.0, 10.0, phase); });
+    return scene.Call(CxComplexModulatorH, x, 3.0, 10.0, phase);
 }

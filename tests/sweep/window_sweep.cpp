@@ -13,13 +13,13 @@ const std::vector<krnumer::Complex> kComplex{{1, -1}, {2, 0}, {3, 1}, {4, 4}, {5
 template <class Window, class... Parameters>
 int32_t PlayReal(sweep::Scene& scene, Window window, Parameters... parameters) {
     const KrHandle x = scene.Replaced(scene.Doubles(kReal));
-    return scene.Call([&] { return window(x, parameters...); });
+    return scene.Call(window, x, parameters...);
 }
 
 template <class Window, class... Parameters>
 int32_t PlayComplex(sweep::Scene& scene, Window window, Parameters... parameters) {
     const KrHandle x = scene.Replaced(scene.Complexes(kComplex));
-    return scene.Call([&] { return window(x, parameters...); });
+    return scene.Call(window, x, parameters...);
 }
 
 }  // namespace
@@ -141,7 +141,7 @@ KrWindowConstants* Constants(sweep::Scene& scene) {
 SWEEP(NumWinConstH) {
     const KrHandle x = scene.Doubles(kReal);
     auto* constants = reinterpret_cast<KrWindowConstants*>(scene.Numbers(2));
-    return scene.Call([&] { return NumWinConstH(x, constants); });
+    return scene.Call(NumWinConstH, x, constants);
 }
 
 SWEEP(ScaledWinH) {

@@ -12,14 +12,14 @@ constexpr KrComplex kW{0.8, -0.6};
 template <class Transform>
 int32_t PlayChirp(sweep::Scene& scene, Transform transform, KrHandle x, int32_t algorithm) {
     const KrHandle y = scene.OutComplexes();
-    return scene.Call([&] { return transform(x, &kA, &kW, 4, algorithm, y); });
+    return scene.Call(transform, x, &kA, &kW, 4, algorithm, y);
 }
 
 template <class Transform>
 int32_t PlayZoom(sweep::Scene& scene, Transform transform, KrHandle x) {
     const KrHandle y = scene.OutComplexes();
     void* slot = nullptr;
-    return scene.Call([&] { return transform(x, 2, 3, -1, 4, y, &slot); });
+    return scene.Call(transform, x, 2, 3, -1, 4, y, &slot);
 }
 
 }  // namespace
@@ -40,7 +40,7 @@ SWEEP_MORE(CxChirpZT_head, convolved) {
 SWEEP(InvChirpZT_head) {
     const KrHandle x = scene.Complexes(kComplex);
     const KrHandle y = scene.OutComplexes();
-    return scene.Call([&] { return InvChirpZT_head(x, &kA, &kW, 3, y); });
+    return scene.Call(InvChirpZT_head, x, &kA, &kW, 3, y);
 }
 
 SWEEP(CxDZTH) {
