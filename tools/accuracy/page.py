@@ -17,3 +17,9 @@ def write(part, script, text):
     else:
         page = f"{page.rstrip()}\n\n{block}"
     PAGE.write_text(page)
+
+
+def table(head, rows):
+    """The first column to the left, the others, figures, to the right."""
+    lines = ["| " + " | ".join(head) + " |", "|---|" + "---:|" * (len(head) - 1)]
+    return "\n".join(lines + ["| " + " | ".join(row) + " |" for row in rows]) + "\n"

@@ -20,6 +20,7 @@ matplotlib.use("Agg")
 import matplotlib.pyplot as plt  # noqa: E402
 import numpy as np  # noqa: E402
 
+import host  # noqa: E402
 import page  # noqa: E402
 
 PROBLEMS = page.ROOT / "tests" / "reference" / "fit" / "nist"
@@ -110,51 +111,22 @@ def digits(computed, certified):
     return 0.0 if not worst < 1 else 15.0 if worst < 1e-15 else -math.log10(worst)
 
 
-class Library:
-    """The exports of fits, with the arrays of the host of the build."""
-
-    def __init__(self, build):
-        self.host = ctypes.CDLL(str(build / "host" / "libkrrt.so"), mode=ctypes.RTLD_GLOBAL)
-        self.library = ctypes.CDLL(str(build / "src" / "libkrnumer.so"))
-        for create in (self.host.KrrtNewArray, self.host.KrrtNewMatrix, self.host.KrrtElements):
-            create.restype = ctypes.c_void_p
-
-    def array(self, values=()):
-        values = np.ascontiguousarray(values, float)
-        create = self.host.KrrtNewMatrix if values.ndim == 2 else self.host.KrrtNewArray
-        handle = ctypes.c_void_p(create(10, *values.shape))
-        ctypes.memmove(self.elements(handle), values.ctypes.data, values.nbytes)
-        return handle
-
-    def elements(self, handle):
-        return ctypes.c_void_p(self.host.KrrtElements(handle))
-
-    def values(self, handle, *shape):
-        out = np.empty(shape)
-        ctypes.memmove(out.ctypes.data, self.elements(handle), out.nbytes)
-        return out
-
+class Fits(host.Library):
     def general(self, h, y, method):
         """Coefficients and covariance; or the status."""
         coef, fit, covariance, mse = self.array(), self.array(), self.array(np.empty((0, 0))), ctypes.c_double()
-        status = self.library.GenLSFit_head(self.array(h), self.array(y), self.array(), method, 1, coef, fit,
+        status = self.exports.GenLSFit_head(self.array(h), self.array(y), self.array(), method, 1, coef, fit,
                                             covariance, ctypes.byref(mse))
-        k = h.shape[1]
-        return (self.values(coef, k), self.values(covariance, k, k)) if status == 0 else status
+        return (self.values(coef), self.values(covariance)) if status == 0 else status
 
     def curve(self, export, problem, tol, start):
         """Coefficients and steps from start values, or from its own where there are none."""
         coef, mse, steps = [ctypes.c_double() for _ in problem.coef], ctypes.c_double(), ctypes.c_int32(100000)
-        status = getattr(self.library, export)(
+        status = getattr(self.exports, export)(
             self.array(problem.y), self.array(problem.x[0]), self.array(), ctypes.c_double(tol), self.array(start),
             *map(ctypes.byref, coef), ctypes.byref(mse), ctypes.byref(steps), ctypes.c_double(1e-30))
         assert status == 0, status
         return np.array([c.value for c in coef]), steps.value
-
-
-def table(head, rows):
-    lines = ["| " + " | ".join(head) + " |", "|---|" + "---:|" * (len(head) - 1)]
-    return "\n".join(lines + ["| " + " | ".join(row) + " |" for row in rows]) + "\n"
 
 
 def picture(conditions, reached):
@@ -201,10 +173,10 @@ def linear(library):
     picture(conditions, reached)
     head = ["Problem", "Condition", *METHODS.values()]
     condition = {name: f"{value:.1e}".replace("e+0", "e").replace("e+", "e") for name, value in conditions.items()}
-    coefficients = table([*head, "NumPy"], [[name, condition[name], *map(figure, reached[name].values()),
-                                             figure(peers[name])] for name in LINEAR])
-    spread = table(head, [[name, condition[name], *map(figure, deviations[name].values())]
-                          for name in LINEAR if len(deviations[name]) == len(METHODS) and load(name).rss > 0])
+    coefficients = page.table([*head, "NumPy"], [[name, condition[name], *map(figure, reached[name].values()),
+                                                  figure(peers[name])] for name in LINEAR])
+    spread = page.table(head, [[name, condition[name], *map(figure, deviations[name].values())]
+                               for name in LINEAR if len(deviations[name]) == len(METHODS) and load(name).rss > 0])
     return coefficients, spread
 
 
@@ -223,13 +195,13 @@ def nonlinear(library):
             coef, steps = library.curve(export, problem, tol, values)
             rows.append([f"{name} · `{export}`", start, f"{tol:.0e}".replace("e-0", "e-"),
                          figure(digits(coef, problem.coef)), str(steps)])
-    return table(["Problem", "Start", "Tolerance", "Digits", "Steps"], rows)
+    return page.table(["Problem", "Start", "Tolerance", "Digits", "Steps"], rows)
 
 
 def main():
     parser = argparse.ArgumentParser(description=__doc__, formatter_class=argparse.RawDescriptionHelpFormatter)
     parser.add_argument("--build", type=pathlib.Path, default=page.ROOT / "build" / "release")
-    library = Library(parser.parse_args().build)
+    library = Fits(parser.parse_args().build)
     coefficients, deviations = linear(library)
     page.write("regression", "regression.py", "\n".join([
         INTRODUCTION, coefficients, LINEAR_NOTES, DEVIATIONS, deviations, NONLINEAR, nonlinear(library)]))
