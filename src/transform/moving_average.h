@@ -43,9 +43,8 @@ void CascadedMovingSums(T* x, int32_t n, int32_t stages, int32_t window, T* sums
         NextMovingSums(together, x, n, window, first, sums, history);
         sums += together.size();
         history += together.size() * Count(window);
-        stages -= static_cast<int32_t>(together.size());
     };
-    while (stages >= 4) run(std::make_index_sequence<4>());
+    for (; stages >= 4; stages -= 4) run(std::make_index_sequence<4>());
     if (stages == 3) run(std::make_index_sequence<3>());
     if (stages == 2) run(std::make_index_sequence<2>());
     if (stages == 1) run(std::make_index_sequence<1>());
