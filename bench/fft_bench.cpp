@@ -1,5 +1,4 @@
-// Forward transforms beside FFTW (planned with FFTW_MEASURE), GSL and KissFFT, all on doubles and in one run. Behind
-// the figures of the single transforms stands a table of times, ratios and geometric means.
+// Forward transforms beside FFTW (planned with FFTW_MEASURE), GSL and KissFFT, all on doubles and in one run.
 //
 // Out of place, the input left alone, at 64-byte boundaries; GSL knows only in place. Real transforms give half-complex
 // form, FFTW's and KissFFT's the first half of the spectrum. KissFFT has no real transform of odd length: there its
@@ -7,15 +6,11 @@
 #include <benchmark/benchmark.h>
 
 #include <algorithm>
-#include <cmath>
 #include <complex>
-#include <cstdio>
 #include <cstdlib>
-#include <map>
 #include <memory>
 #include <random>
 #include <string>
-#include <utility>
 #include <vector>
 
 #include "fft/fft.h"
@@ -35,12 +30,12 @@
 namespace krnumer {
 namespace {
 
-constexpr int32_t kLengths[] = {16,    64,     100,    120,     128,     256,  360,  500,   512,   1000,
-                                1024,  2048,   2187,   3125,    4096,    5000, 8192, 10000, 16384, 30030,
-                                65536, 100000, 262144, 1000000, 1048576, 17,   43,   101,   997,   10007};
+// Powers of two, other products of small primes, and primes.
+constexpr int32_t kLengths[] = {16,   64,    256,    1024,    4096, 16384, 65536, 1048576, 100, 360,
+                                1000, 10000, 100000, 1000000, 2187, 30030, 17,    101,     997, 10007};
 
 enum Kind { kComplexKind, kRealKind };
-constexpr const char* kKindNames[] = {"complex", "real"};
+constexpr const char* kKindNames[] = {"complex transform", "real transform"};
 
 // Room for n complex numbers at a cache line.
 class Buffer {
@@ -167,114 +162,41 @@ class Kiss {
 };
 #endif
 
-std::string Name(Kind kind, int32_t n, const char* peer) {
-    return std::string(kKindNames[kind]) + "/" + std::to_string(n) + "/" + peer;
-}
-
 template <class Peer>
 void Register(Kind kind, int32_t n) {
-    benchmark::RegisterBenchmark(Name(kind, n, Peer::kName).c_str(), [=](benchmark::State& state) {
-        const Arrays arrays(n);
-        double* in = arrays.in.get();
-        double* out = arrays.out.get();
-        const Peer transform(kind, n, in, out);
-        for (auto _ : state) {
-            transform(in, out);
-            benchmark::ClobberMemory();
-        }
-    });
+    const std::string name = std::string(kKindNames[kind]) + "/" + Peer::kName;
+    benchmark::RegisterBenchmark(name.c_str(),
+                                 [=](benchmark::State& state) {
+                                     const Arrays arrays(n);
+                                     double* in = arrays.in.get();
+                                     double* out = arrays.out.get();
+                                     const Peer transform(kind, n, in, out);
+                                     for (auto _ : state) {
+                                         transform(in, out);
+                                         benchmark::ClobberMemory();
+                                     }
+                                 })
+        ->ArgName("n")
+        ->Arg(n);
 }
 
-void RegisterAll(std::vector<const char*>& peers) {
-    const auto add = [&]<class Peer>(std::type_identity<Peer>) {
-        peers.push_back(Peer::kName);
-        return [](Kind kind, int32_t n) { Register<Peer>(kind, n); };
-    };
-    std::vector<void (*)(Kind, int32_t)> all{add(std::type_identity<Own>())};
+const bool kRegistered = [] {
+    for (const Kind kind : {kComplexKind, kRealKind}) {
+        for (const int32_t n : kLengths) {
+            Register<Own>(kind, n);
 #if defined(KRNUMER_HAVE_FFTW)
-    all.push_back(add(std::type_identity<Fftw>()));
+            Register<Fftw>(kind, n);
 #endif
 #if defined(KRNUMER_HAVE_GSL)
-    all.push_back(add(std::type_identity<Gsl>()));
+            Register<Gsl>(kind, n);
 #endif
 #if defined(KRNUMER_HAVE_KISSFFT)
-    all.push_back(add(std::type_identity<Kiss>()));
+            Register<Kiss>(kind, n);
 #endif
-    for (const Kind kind : {kComplexKind, kRealKind})
-        for (const int32_t n : kLengths)
-            for (const auto registration : all) registration(kind, n);
-}
-
-// Remembers the least time of every transform, over the repetitions if there are any.
-class TableReporter : public benchmark::ConsoleReporter {
-  public:
-    void ReportRuns(const std::vector<Run>& runs) override {
-        for (const Run& run : runs) {
-            if (run.run_type != Run::RT_Iteration || run.error_occurred) continue;
-            const double ns = run.GetAdjustedCPUTime();
-            const auto [at, fresh] = least_.try_emplace(run.run_name.function_name, ns);
-            if (!fresh) at->second = std::min(at->second, ns);
         }
-        ConsoleReporter::ReportRuns(runs);
     }
-
-    // Times of all that were measured, their ratios to the library's own, and the library's time per n log2 n.
-    void PrintTable(Kind kind, const std::vector<const char*>& all) const {
-        const auto time = [&](int32_t n, const char* peer) {
-            const auto at = least_.find(Name(kind, n, peer));
-            return at == least_.end() ? 0.0 : at->second;
-        };
-        std::vector<const char*> peers;
-        std::copy_if(all.begin(), all.end(), std::back_inserter(peers), [&](const char* peer) {
-            return std::any_of(std::begin(kLengths), std::end(kLengths),
-                               [&](int32_t n) { return time(n, peer) > 0.0; });
-        });
-        if (peers.empty()) return;
-        std::printf("\n%-8s", kKindNames[kind]);
-        for (const char* peer : peers) std::printf("%12s", (std::string(peer) + " ns").c_str());
-        for (size_t p = 1; p < peers.size(); ++p) std::printf("%10s", (std::string("/") + peers[p]).c_str());
-        std::printf("%14s\n", "ns/(n log2 n)");
-        std::vector<double> logarithms(peers.size());
-        int32_t lengths = 0;
-        for (const int32_t n : kLengths) {
-            if (std::any_of(peers.begin(), peers.end(), [&](const char* peer) { return time(n, peer) == 0.0; }))
-                continue;
-            ++lengths;
-            const double own = time(n, peers[0]);
-            std::printf("%-8d", n);
-            for (const char* peer : peers) std::printf("%12.1f", time(n, peer));
-            for (size_t p = 1; p < peers.size(); ++p) {
-                const double ratio = own / time(n, peers[p]);
-                std::printf("%10.2f", ratio);
-                logarithms[p] += std::log(ratio);
-            }
-            std::printf("%14.3f\n", own / (n * std::log2(n)));
-        }
-        if (lengths == 0 || peers.size() == 1) return;
-        std::printf("%-*s", static_cast<int>(8 + 12 * peers.size()), "geometric mean");
-        for (size_t p = 1; p < peers.size(); ++p) std::printf("%10.2f", std::exp(logarithms[p] / lengths));
-        std::printf("\n");
-    }
-
-  private:
-    std::map<std::string, double> least_;
-};
-
-int Main(int argc, char** argv) {
-    benchmark::Initialize(&argc, argv);
-    if (benchmark::ReportUnrecognizedArguments(argc, argv)) return 1;
-    std::vector<const char*> peers;
-    RegisterAll(peers);
-    TableReporter reporter;
-    benchmark::RunSpecifiedBenchmarks(&reporter);
-    for (const Kind kind : {kComplexKind, kRealKind}) reporter.PrintTable(kind, peers);
-    benchmark::Shutdown();
-    return 0;
-}
+    return true;
+}();
 
 }  // namespace
 }  // namespace krnumer
-
-int main(int argc, char** argv) {
-    return krnumer::Main(argc, argv);
-}

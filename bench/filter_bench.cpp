@@ -1,4 +1,4 @@
-// Filters at work: samples per second over long signals. filter_scipy.py runs this program and sets SciPy beside it.
+// Filters at work: samples per second over long signals. filter_peers.py measures SciPy.
 #include <benchmark/benchmark.h>
 
 #include <algorithm>
@@ -44,25 +44,29 @@ void CountSamples(benchmark::State& state, int32_t samples) {
     state.SetItemsProcessed(state.iterations() * samples);
 }
 
-struct Sections {
+struct Coefficients {
     std::vector<double> a, b;
 };
 
 // Butterworth lowpass (sections of order 2) or bandpass (of order 4).
-Sections Design(int32_t sections, int32_t section_order) {
+Coefficients Design(int32_t sections, int32_t section_order) {
     const FilterBand band{1.0, 0.1, 0.3, 2 * sections, section_order == 2 ? 0 : 2};
     const CascadeLengths lengths = LengthsOf(band.order, band.type);
-    Sections made{std::vector<double>(static_cast<size_t>(lengths.a)),
-                  std::vector<double>(static_cast<size_t>(lengths.b))};
+    Coefficients made{std::vector<double>(static_cast<size_t>(lengths.a)),
+                      std::vector<double>(static_cast<size_t>(lengths.b))};
     ButterworthDesign(band,
                       {made.a.data(), static_cast<int32_t>(lengths.a), made.b.data(), static_cast<int32_t>(lengths.b)});
     return made;
 }
 
+void Sections(benchmark::internal::Benchmark* b) {
+    b->ArgNames({"order", "sections"})->Args({2, 1})->Args({2, 4})->Args({2, 8})->Args({4, 4});
+}
+
 template <class Signal>
 void FilterByCascade(benchmark::State& state) {
     const int32_t section_order = static_cast<int32_t>(state.range(0)), sections = static_cast<int32_t>(state.range(1));
-    const Sections made = Design(sections, section_order);
+    const Coefficients made = Design(sections, section_order);
     std::vector<Signal> x(Count(kSamples)), memory(made.a.size());
     const auto size = [](const auto& array) { return static_cast<int32_t>(array.size()); };
     Cascade<Signal> cascade{sections * 2,  true,         made.a.data(), size(made.a),
@@ -80,14 +84,14 @@ void FilterByCascade(benchmark::State& state) {
     }
     CountSamples(state, kSamples);
 }
-BENCHMARK(FilterByCascade<double>)->Name("Cascade")->Args({2, 4})->Args({4, 4})->Args({2, 1})->Args({2, 8});
-BENCHMARK(FilterByCascade<Complex>)->Name("CascadeOfComplexSignal")->Args({2, 4})->Args({4, 4});
+BENCHMARK(FilterByCascade<double>)->Name("cascade/krnumer")->Apply(Sections);
+BENCHMARK(FilterByCascade<Complex>)->Name("cascade, complex signal/krnumer")->Apply(Sections);
 
 #if defined(KRNUMER_HAVE_LIQUID)
 // Of single precision, the only one that liquid has. A section of order 4 is two of order 2 there.
 void LiquidCascade(benchmark::State& state) {
     const unsigned sections = static_cast<unsigned>(state.range(1) * state.range(0) / 2);
-    const Sections made = Design(static_cast<int32_t>(sections), 2);
+    const Coefficients made = Design(static_cast<int32_t>(sections), 2);
     std::vector<float> a, b;
     for (unsigned k = 0; k < sections; ++k) {
         a.insert(a.end(), {1.0F, static_cast<float>(made.a[2 * k]), static_cast<float>(made.a[2 * k + 1])});
@@ -103,7 +107,7 @@ void LiquidCascade(benchmark::State& state) {
     iirfilt_rrrf_destroy(filter);
     CountSamples(state, kSamples);
 }
-BENCHMARK(LiquidCascade)->Args({2, 4})->Args({4, 4})->Args({2, 1})->Args({2, 8});
+BENCHMARK(LiquidCascade)->Name("cascade/liquid-dsp (float)")->Apply(Sections);
 #endif
 
 // The difference equation with `taps` coefficients on the input side, and as many on the output side or none.
@@ -127,9 +131,12 @@ void FilterDirectly(benchmark::State& state) {
     }
     CountSamples(state, kSamples);
 }
-BENCHMARK(FilterDirectly<double, double>)->Name("DirectForm")->Args({64, 1})->Args({64, 0})->Args({3, 1});
-BENCHMARK(FilterDirectly<Complex, double>)->Name("DirectFormOfComplexSignal")->Args({64, 1});
-BENCHMARK(FilterDirectly<Complex, Complex>)->Name("DirectFormInComplex")->Args({64, 1});
+void Taps(benchmark::internal::Benchmark* b) {
+    b->ArgNames({"taps", "recursive"})->Args({64, 1})->Args({64, 0})->Args({3, 1});
+}
+BENCHMARK(FilterDirectly<double, double>)->Name("direct form/krnumer")->Apply(Taps);
+BENCHMARK(FilterDirectly<Complex, double>)->Name("direct form, complex signal/krnumer")->Apply(Taps);
+BENCHMARK(FilterDirectly<Complex, Complex>)->Name("complex direct form/krnumer")->Apply(Taps);
 
 void FilterByMedian(benchmark::State& state) {
     const int32_t rank = static_cast<int32_t>(state.range(0)) / 2;
@@ -143,7 +150,7 @@ void FilterByMedian(benchmark::State& state) {
     }
     CountSamples(state, kFewer);
 }
-BENCHMARK(FilterByMedian)->Name("Median")->Arg(5)->Arg(51)->Arg(501)->Arg(5001);
+BENCHMARK(FilterByMedian)->Name("running median/krnumer")->ArgName("width")->Arg(5)->Arg(51)->Arg(501);
 
 void SmoothByPolynomials(benchmark::State& state) {
     const int32_t frame = static_cast<int32_t>(state.range(0));
@@ -155,7 +162,7 @@ void SmoothByPolynomials(benchmark::State& state) {
     }
     CountSamples(state, kSamples);
 }
-BENCHMARK(SmoothByPolynomials)->Name("SavitzkyGolay")->Arg(11)->Arg(101);
+BENCHMARK(SmoothByPolynomials)->Name("Savitzky-Golay/krnumer")->ArgName("width")->Arg(11)->Arg(101);
 
 }  // namespace
 }  // namespace krnumer

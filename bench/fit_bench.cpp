@@ -1,4 +1,4 @@
-// Lines, polynomials and robust lines: points per second. fit_numpy.py runs this program and sets NumPy beside it.
+// Lines, polynomials and robust lines: points per second. fit_peers.py measures NumPy.
 #include <benchmark/benchmark.h>
 
 #include <random>
@@ -45,6 +45,10 @@ void Run(benchmark::State& state, Fit fit) {
 
 // ---- Lines ----
 
+void LinePoints(benchmark::internal::Benchmark* b) {
+    b->ArgName("n")->Arg(10000)->Arg(1000000);
+}
+
 void Line(benchmark::State& state) {
     Points points(state.range(0));
     double slope, intercept, mse;
@@ -53,13 +57,17 @@ void Line(benchmark::State& state) {
                           &intercept, &mse);
     });
 }
-BENCHMARK(Line)->Arg(10000)->Arg(1000000)->Unit(benchmark::kMillisecond);
+BENCHMARK(Line)->Name("line/krnumer")->Apply(LinePoints);
 
-// ---- Polynomials: points, order, method ----
+// ---- Polynomials, by each method ----
 
-void Polynomial(benchmark::State& state) {
+void PolynomialOrders(benchmark::internal::Benchmark* b) {
+    b->ArgNames({"n", "order"})->ArgsProduct({{10000}, {2, 5, 10}});
+}
+
+void Polynomial(benchmark::State& state, int32_t method) {
     Points points(state.range(0));
-    const auto order = static_cast<int32_t>(state.range(1)), method = static_cast<int32_t>(state.range(2));
+    const auto order = static_cast<int32_t>(state.range(1));
     std::vector<double> coef(Count(order + 1));
     double mse;
     Run(state, [&] {
@@ -67,11 +75,12 @@ void Polynomial(benchmark::State& state) {
                            points.fit.data(), coef.data(), &mse);
     });
 }
-BENCHMARK(Polynomial)
-    ->ArgsProduct({{10000, 1000000},
-                   {1, 5, 10},
-                   {kSvdMethod, kHouseholderMethod, kLUMethod, kCholeskyMethod, kTruncatedSvdMethod}})
-    ->Unit(benchmark::kMillisecond);
+BENCHMARK_CAPTURE(Polynomial, svd, kSvdMethod)->Name("polynomial by SVD/krnumer")->Apply(PolynomialOrders);
+BENCHMARK_CAPTURE(Polynomial, qr, kHouseholderMethod)->Name("polynomial by QR/krnumer")->Apply(PolynomialOrders);
+BENCHMARK_CAPTURE(Polynomial, lu, kLUMethod)->Name("polynomial by LU/krnumer")->Apply(PolynomialOrders);
+BENCHMARK_CAPTURE(Polynomial, cholesky, kCholeskyMethod)
+    ->Name("polynomial by Cholesky/krnumer")
+    ->Apply(PolynomialOrders);
 
 // ---- Robust lines ----
 
@@ -83,7 +92,7 @@ void BisquareLine(benchmark::State& state) {
         return BisquareFit(LineFitter{}, points.data(), nullptr, 1e-4, coef, &steps, points.fit.data(), &residue);
     });
 }
-BENCHMARK(BisquareLine)->Arg(100000)->Unit(benchmark::kMillisecond);
+BENCHMARK(BisquareLine)->Name("bisquare line/krnumer")->ArgName("n")->Arg(100000);
 
 void AbsoluteLine(benchmark::State& state) {
     Points points(state.range(0), true);
@@ -93,7 +102,7 @@ void AbsoluteLine(benchmark::State& state) {
         return LeastAbsoluteLine(points.data(), 1e-4, -1.0, coef, &steps, points.fit.data(), &residue);
     });
 }
-BENCHMARK(AbsoluteLine)->Arg(100000)->Unit(benchmark::kMillisecond);
+BENCHMARK(AbsoluteLine)->Name("least absolute line/krnumer")->ArgName("n")->Arg(100000);
 
 // ---- GSL ----
 
@@ -111,7 +120,7 @@ void GslLine(benchmark::State& state) {
                               &sum);
     });
 }
-BENCHMARK(GslLine)->Arg(10000)->Arg(1000000)->Unit(benchmark::kMillisecond);
+BENCHMARK(GslLine)->Name("line/GSL")->Apply(LinePoints);
 
 // The matrix of powers is part of the fit, as it is in ours.
 void Powers(const std::vector<double>& x, gsl_matrix* powers) {
@@ -138,7 +147,11 @@ void GslPolynomial(benchmark::State& state) {
     gsl_matrix_free(covariance);
     gsl_matrix_free(powers);
 }
-BENCHMARK(GslPolynomial)->ArgsProduct({{10000, 1000000}, {1, 5, 10}})->Unit(benchmark::kMillisecond);
+// GSL fits by SVD, which stands beside each of our methods.
+BENCHMARK(GslPolynomial)->Name("polynomial by SVD/GSL")->Apply(PolynomialOrders);
+BENCHMARK(GslPolynomial)->Name("polynomial by QR/GSL")->Apply(PolynomialOrders);
+BENCHMARK(GslPolynomial)->Name("polynomial by LU/GSL")->Apply(PolynomialOrders);
+BENCHMARK(GslPolynomial)->Name("polynomial by Cholesky/GSL")->Apply(PolynomialOrders);
 
 void GslBisquareLine(benchmark::State& state) {
     const Points points(state.range(0), true);
@@ -156,7 +169,7 @@ void GslBisquareLine(benchmark::State& state) {
     gsl_matrix_free(covariance);
     gsl_matrix_free(powers);
 }
-BENCHMARK(GslBisquareLine)->Arg(100000)->Unit(benchmark::kMillisecond);
+BENCHMARK(GslBisquareLine)->Name("bisquare line/GSL")->ArgName("n")->Arg(100000);
 
 #endif
 

@@ -18,7 +18,7 @@ void MeanCore(benchmark::State& state) {
         benchmark::DoNotOptimize(mean);
     }
 }
-BENCHMARK(MeanCore);
+BENCHMARK(MeanCore)->Name("core/krnumer");
 
 void MeanEntry(benchmark::State& state, int32_t least_alignment) {
     KrrtLeastAlignment(least_alignment);
@@ -32,8 +32,8 @@ void MeanEntry(benchmark::State& state, int32_t least_alignment) {
     }
     KrrtFree(x);
 }
-BENCHMARK_CAPTURE(MeanEntry, Aligned, 0);
-BENCHMARK_CAPTURE(MeanEntry, LeastAlignment, 1);
+BENCHMARK_CAPTURE(MeanEntry, aligned, 0)->Name("entry point/krnumer");
+BENCHMARK_CAPTURE(MeanEntry, least_alignment, 1)->Name("entry point, elements out of alignment/krnumer");
 
 // One output that keeps its size: the host's resize is in it.
 void ImpulseEntry(benchmark::State& state) {
@@ -47,6 +47,6 @@ void ImpulseEntry(benchmark::State& state) {
     }
     KrrtFree(x);
 }
-BENCHMARK(ImpulseEntry);
+BENCHMARK(ImpulseEntry)->Name("entry point that sizes an output/krnumer");
 
 }  // namespace

@@ -1,5 +1,5 @@
-// Waves beside the least and the most that they could cost: a plain multiplication of the array, which memory limits,
-// and a sine for every sample.
+// Waves, beside a sine for every sample; gen_peers.py measures NumPy and SciPy. No wave could cost less than the plain
+// multiplication of the array, which memory limits.
 #include <benchmark/benchmark.h>
 
 #include <cmath>
@@ -31,6 +31,7 @@ void Measure(benchmark::State& state, Make make) {
 template <class Make>
 void Register(const char* name, Make make) {
     benchmark::RegisterBenchmark(name, [make](benchmark::State& state) { Measure(state, make); })
+        ->ArgName("n")
         ->Arg(1000)
         ->Arg(1000000);
 }
@@ -43,7 +44,7 @@ void Multiply(benchmark::State& state) {
         for (int32_t i = 0; i < n; ++i) y[i] *= factors[Count(i)];
     });
 }
-BENCHMARK(Multiply)->Arg(1000)->Arg(1000000);
+BENCHMARK(Multiply)->Name("multiplication/plain loop")->ArgName("n")->Arg(1000)->Arg(1000000);
 
 void SinePerSample(double* y, int32_t n) {
     const double step = 2.0 * kPi * kFrequency;
@@ -57,29 +58,29 @@ const std::vector<double> kTable(512, 0.5);
 const int32_t kTableSize = static_cast<int32_t>(kTable.size());
 
 const bool kRegistered = [] {
-    Register("SinePerSample", SinePerSample);
-    Register("SineWave", [](double* y, int32_t n) { SineWave(y, n, 2.0, kFrequency, &phase); });
-    Register("SawtoothWave", [](double* y, int32_t n) { SawtoothWave(y, n, 2.0, kFrequency, &phase); });
-    Register("TriangleWave", [](double* y, int32_t n) { TriangleWave(y, n, 2.0, kFrequency, &phase); });
-    Register("SquareWave", [](double* y, int32_t n) { SquareWave(y, n, 2.0, kFrequency, &phase, 30.0); });
-    Register("ArbitraryWave/before",
+    Register("sine/std::sin", SinePerSample);
+    Register("sine/krnumer", [](double* y, int32_t n) { SineWave(y, n, 2.0, kFrequency, &phase); });
+    Register("sawtooth/krnumer", [](double* y, int32_t n) { SawtoothWave(y, n, 2.0, kFrequency, &phase); });
+    Register("triangle/krnumer", [](double* y, int32_t n) { TriangleWave(y, n, 2.0, kFrequency, &phase); });
+    Register("square/krnumer", [](double* y, int32_t n) { SquareWave(y, n, 2.0, kFrequency, &phase, 30.0); });
+    Register("table, sample before/krnumer",
              [](double* y, int32_t n) { ArbitraryWave(y, n, 2.0, kFrequency, &phase, kTable.data(), kTableSize, 0); });
-    Register("ArbitraryWave/interpolated",
+    Register("table, interpolated/krnumer",
              [](double* y, int32_t n) { ArbitraryWave(y, n, 2.0, kFrequency, &phase, kTable.data(), kTableSize, 1); });
-    Register("Chirp", [](double* y, int32_t n) { Chirp(y, n, 2.0, 0.0, 0.4); });
+    Register("chirp/krnumer", [](double* y, int32_t n) { Chirp(y, n, 2.0, 0.0, 0.4); });
 
-    Register("SquarePattern", [](double* y, int32_t n) { SquarePattern(y, n, 2.0, 30.0, n / 50.0); });
-    Register("PulsePattern", [](double* y, int32_t n) { PulsePattern(y, n, 2.0, n / 3, n / 4); });
-    Register("RampPattern", [](double* y, int32_t n) { RampPattern(y, n, 0.0, 1.0, 0); });
-    Register("SincPattern", [](double* y, int32_t n) { SincPattern(y, n, 2.0, 3.0, 0.1); });
+    Register("square pattern/krnumer", [](double* y, int32_t n) { SquarePattern(y, n, 2.0, 30.0, n / 50.0); });
+    Register("pulse pattern/krnumer", [](double* y, int32_t n) { PulsePattern(y, n, 2.0, n / 3, n / 4); });
+    Register("ramp pattern/krnumer", [](double* y, int32_t n) { RampPattern(y, n, 0.0, 1.0, 0); });
+    Register("sinc pattern/krnumer", [](double* y, int32_t n) { SincPattern(y, n, 2.0, 3.0, 0.1); });
 
-    Register("AperiodicTriangle",
+    Register("triangle pulse/krnumer",
              [](double* y, int32_t n) { AperiodicTriangle(nullptr, y, n, 2.0, 0.3, 1.0 / n, 0.4, 0.3); });
-    Register("GaussianMonopulse",
+    Register("Gaussian monopulse/krnumer",
              [](double* y, int32_t n) { GaussianMonopulse(nullptr, y, n, 1.0 / n, 0.5, 3.0, 2.0); });
-    Register("GaussianPulse",
+    Register("Gaussian pulse/krnumer",
              [](double* y, int32_t n) { GaussianPulse(nullptr, y, n, 2.0, 0.5, 1.0 / n, 10.0, 0.5, 6.0); });
-    Register("PeriodicSinc", [](double* y, int32_t n) { PeriodicSinc(nullptr, y, n, 2.0, 7, 0.01, 0.5); });
+    Register("periodic sinc/krnumer", [](double* y, int32_t n) { PeriodicSinc(nullptr, y, n, 2.0, 7, 0.01, 0.5); });
     return true;
 }();
 

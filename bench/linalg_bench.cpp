@@ -79,7 +79,7 @@ void Register(const std::string& name, std::vector<T> (*make)(int), Run run) {
             benchmark::ClobberMemory();
         }
     });
-    for (const int n : {2, 4, 6, 10, 50, 100, 200, 500}) benchmark->Arg(n);
+    for (const int n : {3, 10, 50, 200, 500}) benchmark->ArgName("n")->Arg(n);
 }
 
 template <class T>
@@ -115,11 +115,11 @@ void RegisterFactorisations() {
         int info;
         dgetrf_(&n, &n, a, &n, pivots, &info);
     });
-    Register("ComplexLU/krnumer", RandomMatrix<Complex>, [](Complex* a, int n, int* pivots) {
+    Register("complex LU/krnumer", RandomMatrix<Complex>, [](Complex* a, int n, int* pivots) {
         int parity;
         LUFactor(a, n, pivots, &parity);
     });
-    Register("ComplexLU/LAPACK", RandomMatrix<Complex>, [](Complex* a, int n, int* pivots) {
+    Register("complex LU/LAPACK", RandomMatrix<Complex>, [](Complex* a, int n, int* pivots) {
         int info;
         zgetrf_(&n, &n, a, &n, pivots, &info);
     });
@@ -128,9 +128,9 @@ void RegisterFactorisations() {
         int info;
         dpotrf_("L", &n, a, &n, &info, 1);
     });
-    Register("ComplexCholesky/krnumer", PackedDefiniteMatrix<Complex>,
+    Register("complex Cholesky/krnumer", PackedDefiniteMatrix<Complex>,
              [](Complex* a, int n, int*) { CholeskyPacked(a, n); });
-    Register("ComplexCholesky/LAPACK", DefiniteMatrix<Complex>, [](Complex* a, int n, int*) {
+    Register("complex Cholesky/LAPACK", DefiniteMatrix<Complex>, [](Complex* a, int n, int*) {
         int info;
         zpotrf_("L", &n, a, &n, &info, 1);
     });
@@ -164,30 +164,30 @@ void RegisterFactorisations() {
 }
 
 void RegisterSolutions() {
-    Register("SolveByLU/krnumer", RandomMatrix<double>, [](double* a, int n, int*) {
+    Register("solution by LU/krnumer", RandomMatrix<double>, [](double* a, int n, int*) {
         std::vector<double> b = RightSide(n), x(Count(n));
         LUSolveDirect(a, n, b.data(), x.data());
         benchmark::DoNotOptimize(x.data());
     });
-    Register("SolveByLU/LAPACK", RandomMatrix<double>, [](double* a, int n, int* pivots) {
+    Register("solution by LU/LAPACK", RandomMatrix<double>, [](double* a, int n, int* pivots) {
         std::vector<double> b = RightSide(n);
         int info;
         dgesv_(&n, &kOne, a, &n, pivots, b.data(), &n, &info);
         benchmark::DoNotOptimize(b.data());
     });
-    Register("SolveByCholesky/krnumer", DefiniteMatrix<double>, [](double* a, int n, int*) {
+    Register("solution by Cholesky/krnumer", DefiniteMatrix<double>, [](double* a, int n, int*) {
         std::vector<double> b = RightSide(n), x(Count(n));
         CholeskySolveFull(a, n, kUpper, b.data(), 1, x.data());
         benchmark::DoNotOptimize(x.data());
     });
-    Register("SolveByCholesky/LAPACK", DefiniteMatrix<double>, [](double* a, int n, int*) {
+    Register("solution by Cholesky/LAPACK", DefiniteMatrix<double>, [](double* a, int n, int*) {
         std::vector<double> b = RightSide(n);
         int info;
         dposv_("L", &n, &kOne, a, &n, b.data(), &n, &info, 1);
         benchmark::DoNotOptimize(b.data());
     });
-    Register("Invert/krnumer", RandomMatrix<double>, [](double* a, int n, int*) { InvertByLU(a, n); });
-    Register("Invert/LAPACK", RandomMatrix<double>, [](double* a, int n, int* pivots) {
+    Register("inverse/krnumer", RandomMatrix<double>, [](double* a, int n, int*) { InvertByLU(a, n); });
+    Register("inverse/LAPACK", RandomMatrix<double>, [](double* a, int n, int* pivots) {
         std::vector<double> work(64 * Count(n));
         const int lwork = 64 * n;
         int info;
@@ -195,7 +195,7 @@ void RegisterSolutions() {
         dgetri_(&n, a, &n, pivots, work.data(), &lwork, &info);
     });
 #ifdef KRNUMER_HAVE_GSL
-    Register("SolveByLU/GSL", RandomMatrix<double>, [](double* a, int n, int*) {
+    Register("solution by LU/GSL", RandomMatrix<double>, [](double* a, int n, int*) {
         std::vector<double> b = RightSide(n);
         const GslPermutation permutation(n);
         gsl_matrix_view view = gsl_matrix_view_array(a, Count(n), Count(n));
@@ -205,7 +205,7 @@ void RegisterSolutions() {
         gsl_linalg_LU_svx(&view.matrix, permutation, &x.vector);
         benchmark::DoNotOptimize(b.data());
     });
-    Register("SolveByCholesky/GSL", DefiniteMatrix<double>, [](double* a, int n, int*) {
+    Register("solution by Cholesky/GSL", DefiniteMatrix<double>, [](double* a, int n, int*) {
         std::vector<double> b = RightSide(n);
         gsl_matrix_view view = gsl_matrix_view_array(a, Count(n), Count(n));
         gsl_vector_view x = gsl_vector_view_array(b.data(), Count(n));
@@ -213,7 +213,7 @@ void RegisterSolutions() {
         gsl_linalg_cholesky_svx(&view.matrix, &x.vector);
         benchmark::DoNotOptimize(b.data());
     });
-    Register("Invert/GSL", RandomMatrix<double>, [](double* a, int n, int*) {
+    Register("inverse/GSL", RandomMatrix<double>, [](double* a, int n, int*) {
         const GslPermutation permutation(n);
         gsl_matrix_view view = gsl_matrix_view_array(a, Count(n), Count(n));
         int sign;

@@ -44,6 +44,10 @@ void Measure(benchmark::State& state, Body body) {
     state.SetItemsProcessed(state.iterations() * state.range(0));
 }
 
+void Sizes(benchmark::internal::Benchmark* b) {
+    b->ArgName("n")->Arg(1000)->Arg(100000);
+}
+
 // All 33, each of which looks at the first occurrence.
 template <class Body>
 void ForAll(Body body) {
@@ -55,18 +59,18 @@ void ForAll(Body body) {
 void RiseTime(benchmark::State& state) {
     Measure(state, [](int32_t id, const auto& samples) { Fetch(id, KRN_RISE_TIME, samples); });
 }
-BENCHMARK(RiseTime)->Arg(1000)->Arg(100000);
+BENCHMARK(RiseTime)->Name("rise time/krnumer")->Apply(Sizes);
 
 void AllInOneContext(benchmark::State& state) {
     Measure(state,
             [](int32_t id, const auto& samples) { ForAll([&](int32_t selector) { Fetch(id, selector, samples); }); });
 }
-BENCHMARK(AllInOneContext)->Arg(1000)->Arg(100000);
+BENCHMARK(AllInOneContext)->Name("all 33, one context/krnumer")->Apply(Sizes);
 
 void AllByThemselves(benchmark::State& state) {
     Measure(state,
             [](int32_t, const auto& samples) { ForAll([&](int32_t selector) { Fetch(-1, selector, samples); }); });
 }
-BENCHMARK(AllByThemselves)->Arg(1000)->Arg(100000);
+BENCHMARK(AllByThemselves)->Name("all 33, a context for each/krnumer")->Apply(Sizes);
 
 }  // namespace

@@ -1,4 +1,4 @@
-// Peaks of a million samples, in one call and in blocks. peak_scipy.py measures SciPy's find_peaks on the same signal.
+// Peaks of a million samples, in one call and in blocks. peak_peers.py measures SciPy on the same signal.
 
 #include <benchmark/benchmark.h>
 
@@ -44,6 +44,7 @@ void Parabolas(benchmark::State& state) {
         KrrtFree(array);
 }
 BENCHMARK(Parabolas)
+    ->Name("peaks of parabolas/krnumer")
     ->ArgNames({"width", "block"})
     ->ArgsProduct({{3, 5, 15, 51}, {1000, kSamples}})
     ->Unit(benchmark::kMillisecond);
@@ -62,6 +63,6 @@ void Runs(benchmark::State& state) {
     KrrtFree(input);
     KrrtFree(indices);
 }
-BENCHMARK(Runs)->Unit(benchmark::kMillisecond);
+BENCHMARK(Runs)->Name("peaks of runs/krnumer")->Unit(benchmark::kMillisecond);
 
 }  // namespace

@@ -1,6 +1,7 @@
 // Convolution beside plain loops and beside FFTW, planned once and run at the next length it is fast at, with the table
 // of the transform held by someone else, as that plan is, and with none; changes of the sampling rate beside
-// liquid-dsp, which computes in single precision, and beside a copy of the samples.
+// liquid-dsp, which computes in single precision, and beside a copy of the samples. sigop_peers.py measures NumPy and
+// SciPy.
 #include <benchmark/benchmark.h>
 
 #include <algorithm>
@@ -91,12 +92,13 @@ void NaiveLoop(benchmark::State& state) {
 }
 
 void DirectLengths(benchmark::internal::Benchmark* benchmark) {
-    for (const auto& [nx, ny] : {std::pair{1000, 1000}, {100000, 32}, {100000, 1000}}) benchmark->Args({nx, ny});
+    for (const auto& [nx, ny] : {std::pair{1000, 1000}, {100000, 32}, {100000, 1000}})
+        benchmark->ArgNames({"nx", "ny"})->Args({nx, ny});
 }
-BENCHMARK(DirectReal)->Apply(DirectLengths);
-BENCHMARK(NaiveLoop<double>)->Apply(DirectLengths);
-BENCHMARK(DirectComplex)->Apply(DirectLengths);
-BENCHMARK(NaiveLoop<Complex>)->Apply(DirectLengths);
+BENCHMARK(DirectReal)->Name("direct convolution/krnumer")->Apply(DirectLengths);
+BENCHMARK(NaiveLoop<double>)->Name("direct convolution/plain loop")->Apply(DirectLengths);
+BENCHMARK(DirectComplex)->Name("direct convolution, complex/krnumer")->Apply(DirectLengths);
+BENCHMARK(NaiveLoop<Complex>)->Name("direct convolution, complex/plain loop")->Apply(DirectLengths);
 
 void SpectralReal(benchmark::State& state, bool table_held) {
     Sequences<double> s(state);
@@ -109,11 +111,13 @@ void SpectralReal(benchmark::State& state, bool table_held) {
 }
 
 void SpectralLengths(benchmark::internal::Benchmark* benchmark) {
-    for (const auto& [nx, ny] : {std::pair{1000, 1000}, {100000, 1000}, {1000000, 1000000}}) benchmark->Args({nx, ny});
-    benchmark->Unit(benchmark::kMicrosecond);
+    for (const auto& [nx, ny] : {std::pair{1000, 1000}, {100000, 1000}, {1000000, 1000000}})
+        benchmark->ArgNames({"nx", "ny"})->Args({nx, ny});
 }
-BENCHMARK_CAPTURE(SpectralReal, table_held, true)->Apply(SpectralLengths);
-BENCHMARK_CAPTURE(SpectralReal, table_built, false)->Apply(SpectralLengths);
+BENCHMARK_CAPTURE(SpectralReal, table_held, true)->Name("convolution by FFT/krnumer")->Apply(SpectralLengths);
+BENCHMARK_CAPTURE(SpectralReal, table_built, false)
+    ->Name("convolution by FFT, no table/krnumer")
+    ->Apply(SpectralLengths);
 
 #ifdef KRNUMER_HAVE_FFTW
 
@@ -158,11 +162,11 @@ void SpectralFftw(benchmark::State& state) {
     fftw_free(fa);
     fftw_free(fb);
 }
-BENCHMARK(SpectralFftw)->Apply(SpectralLengths);
+BENCHMARK(SpectralFftw)->Name("convolution by FFT/FFTW")->Apply(SpectralLengths);
 
 #endif
 
-// An image and a kernel; SciPy's times come from sigop_scipy.py.
+// An image and a kernel.
 void Planes(benchmark::State& state, int32_t algorithm) {
     const std::vector<double> x = Samples<double>(512 * 512), y = Samples<double>(31 * 31);
     std::vector<double> z(542 * 542);
@@ -171,8 +175,8 @@ void Planes(benchmark::State& state, int32_t algorithm) {
         benchmark::DoNotOptimize(z.data());
     }
 }
-BENCHMARK_CAPTURE(Planes, direct, kDirect)->Unit(benchmark::kMillisecond);
-BENCHMARK_CAPTURE(Planes, frequency_domain, kFrequencyDomain)->Unit(benchmark::kMillisecond);
+BENCHMARK_CAPTURE(Planes, direct, kDirect)->Name("plane convolution, direct/krnumer");
+BENCHMARK_CAPTURE(Planes, frequency_domain, kFrequencyDomain)->Name("plane convolution by FFT/krnumer");
 
 // ---- Decimation: bytes of the input per second, beside a copy -----------------------------------------------------
 
@@ -193,7 +197,7 @@ void Copy(benchmark::State& state) {
         std::memcpy(y.data(), x.data(), x.size() * sizeof(double));
     });
 }
-BENCHMARK(Copy);
+BENCHMARK(Copy)->Name("copy/memcpy");
 
 // In place: the block shrinks to its own beginning, and what is behind it stays, so that every run reads samples.
 void DecimateBlock(benchmark::State& state, bool averaging) {
@@ -203,8 +207,8 @@ void DecimateBlock(benchmark::State& state, bool averaging) {
         Decimate(y.data(), static_cast<int32_t>(x.size()), factor, averaging, &count);
     });
 }
-BENCHMARK_CAPTURE(DecimateBlock, every, false)->Arg(4)->Arg(100);
-BENCHMARK_CAPTURE(DecimateBlock, means, true)->Arg(4)->Arg(100);
+BENCHMARK_CAPTURE(DecimateBlock, every, false)->Name("decimation/krnumer")->ArgName("factor")->Arg(4)->Arg(100);
+BENCHMARK_CAPTURE(DecimateBlock, means, true)->Name("decimation by means/krnumer")->ArgName("factor")->Arg(4)->Arg(100);
 
 // ---- Resampling by 160/147 in blocks of 14700, filters of 10 samples to both sides; outputs per second -------------
 
@@ -243,8 +247,8 @@ void Rational(benchmark::State& state) {
     }
     state.SetItemsProcessed(outputs);
 }
-BENCHMARK(Rational<double>);
-BENCHMARK(Rational<Complex>);
+BENCHMARK(Rational<double>)->Name("rational resampling/krnumer");
+BENCHMARK(Rational<Complex>)->Name("rational resampling, complex/krnumer");
 
 template <class T, bool nearest>
 void Constant(benchmark::State& state) {
@@ -268,9 +272,9 @@ void Constant(benchmark::State& state) {
     }
     state.SetItemsProcessed(outputs);
 }
-BENCHMARK_TEMPLATE(Constant, double, false);
-BENCHMARK_TEMPLATE(Constant, double, true);
-BENCHMARK_TEMPLATE(Constant, Complex, false);
+BENCHMARK(Constant<double, false>)->Name("constant resampling/krnumer");
+BENCHMARK(Constant<double, true>)->Name("constant resampling, nearest/krnumer");
+BENCHMARK(Constant<Complex, false>)->Name("constant resampling, complex/krnumer");
 
 #ifdef KRNUMER_HAVE_LIQUID
 
@@ -287,7 +291,7 @@ void RationalLiquid(benchmark::State& state) {
     state.SetItemsProcessed(state.iterations() * (kBlock / kDown) * kUp);
     rresamp_rrrf_destroy(resampler);
 }
-BENCHMARK(RationalLiquid);
+BENCHMARK(RationalLiquid)->Name("rational resampling/liquid-dsp (float)");
 
 void ConstantLiquid(benchmark::State& state) {
     const resamp_rrrf resampler =
@@ -304,7 +308,7 @@ void ConstantLiquid(benchmark::State& state) {
     state.SetItemsProcessed(outputs);
     resamp_rrrf_destroy(resampler);
 }
-BENCHMARK(ConstantLiquid);
+BENCHMARK(ConstantLiquid)->Name("constant resampling/liquid-dsp (float)");
 
 #endif
 

@@ -1,4 +1,4 @@
-// Special functions: time of a call beside Boost.Math and GSL on the same arguments. Names are function/library.
+// Special functions: time of a call beside Boost.Math and GSL on the same arguments.
 //
 // The library is called through its exports. Boost works in double, as the others do, instead of its default of
 // promoting to long double.
@@ -79,12 +79,12 @@ using Policy = bm::policies::policy<bm::policies::promote_double<false>, bm::pol
                                     bm::policies::domain_error<bm::policies::ignore_error>,
                                     bm::policies::overflow_error<bm::policies::ignore_error>>;
 constexpr Policy kPolicy;
-#define BOOST(name, call) Measure(std::string(name) + "/boost", ranges, [](const Arguments& x) { return call; })
+#define BOOST(name, call) Measure(std::string(name) + "/Boost.Math", ranges, [](const Arguments& x) { return call; })
 #else
 #define BOOST(name, call)
 #endif
 #if defined(KRNUMER_HAVE_GSL)
-#define GSL(name, call) Measure(std::string(name) + "/gsl", ranges, [](const Arguments& x) { return call; })
+#define GSL(name, call) Measure(std::string(name) + "/GSL", ranges, [](const Arguments& x) { return call; })
 #else
 #define GSL(name, call)
 #endif
@@ -260,14 +260,14 @@ void Others() {
             return v[0] + v[1] + v[2];
         });
 #if defined(KRNUMER_HAVE_BOOST)
-        Measure("EllipticJ/boost", ranges, [](const Arguments& x) {
+        Measure("EllipticJ/Boost.Math", ranges, [](const Arguments& x) {
             double cn, dn;
             const double sn = bm::jacobi_elliptic(std::sqrt(x.a), x.b, &cn, &dn, kPolicy);
             return sn + cn + dn;
         });
 #endif
 #if defined(KRNUMER_HAVE_GSL)
-        Measure("EllipticJ/gsl", ranges, [](const Arguments& x) {
+        Measure("EllipticJ/GSL", ranges, [](const Arguments& x) {
             double sn, cn, dn;
             gsl_sf_elljac_e(x.b, x.a, &sn, &cn, &dn);
             return sn + cn + dn;

@@ -1,13 +1,11 @@
-// Windows beside the least that any of them could cost: a multiplication of the samples by weights computed before.
-// times_multiply is the ratio of both in processor time, measured one after the other.
-//
-// Arguments: samples, and how many arrays take turns. One array stays in the caches; 16 of a million samples do not.
+// Windows of real samples, and some of complex ones. No window could cost less than the multiplication of the samples by
+// weights computed before. window_peers.py measures SciPy.
 #include <benchmark/benchmark.h>
 
 #include <cmath>
-#include <cstddef>
 #include <cstdint>
-#include <ctime>
+#include <initializer_list>
+#include <string>
 #include <type_traits>
 #include <vector>
 
@@ -23,111 +21,71 @@
 namespace krnumer {
 namespace {
 
-template <class T>
-using Arrays = std::vector<std::vector<T>>;
-
-// Infinite samples, which no weight ever wears down to denormals, however often it is applied.
-template <class T>
-Arrays<T> NewArrays(const benchmark::State& state) {
+// On infinite samples, which no weight ever wears down to denormals, however often it is applied.
+template <class T, class Window>
+void Measure(benchmark::State& state, Window window) {
+    const int32_t n = static_cast<int32_t>(state.range(0));
     T sample;
     if constexpr (std::is_same_v<T, Complex>)
         sample = {kInfinity, kInfinity};
     else
         sample = kInfinity;
-    return Arrays<T>(static_cast<std::size_t>(state.range(1)),
-                     std::vector<T>(static_cast<std::size_t>(state.range(0)), sample));
-}
-
-double ProcessorSeconds() {
-    return static_cast<double>(std::clock()) / CLOCKS_PER_SEC;
-}
-
-// Seconds for one multiplication of an array.
-template <class T>
-double MultiplySeconds(Arrays<T>& arrays) {
-    const std::size_t n = arrays[0].size();
-    const Arrays<double> weights(arrays.size(), std::vector<double>(n, 0.999));
-    const std::size_t rounds = 100000000 / (n * arrays.size());
-    const double start = ProcessorSeconds();
-    for (std::size_t round = 0; round < rounds; ++round) {
-        for (std::size_t turn = 0; turn < arrays.size(); ++turn) {
-            MultiplyByWeights(arrays[turn].data(), weights[turn].data(), static_cast<int32_t>(n));
-            benchmark::ClobberMemory();
-        }
-    }
-    return (ProcessorSeconds() - start) / static_cast<double>(rounds * arrays.size());
-}
-
-template <class T, class Window>
-void Measure(benchmark::State& state, Window window) {
-    const int32_t n = static_cast<int32_t>(state.range(0));
-    Arrays<T> arrays = NewArrays<T>(state);
-    const double multiply = MultiplySeconds(arrays);
-    const double start = ProcessorSeconds();
-    std::size_t turn = 0;
+    std::vector<T> samples(Count(n), sample);
     for (auto _ : state) {
-        window(arrays[turn].data(), n);
+        window(samples.data(), n);
         benchmark::ClobberMemory();
-        if (++turn == arrays.size()) turn = 0;
     }
-    const double seconds = (ProcessorSeconds() - start) / static_cast<double>(state.iterations());
     state.SetItemsProcessed(state.iterations() * n);
-    state.counters["times_multiply"] = seconds / multiply;
 }
 
-void Cached(benchmark::internal::Benchmark* b) {
-    b->Args({1000, 1})->Args({1000000, 1});
-}
-
-void CachedAndNot(benchmark::internal::Benchmark* b) {
-    b->Args({1000, 1})->Args({1000000, 1})->Args({1000000, 16});
-}
-
-void Quadratic(benchmark::internal::Benchmark* b) {
-    b->Args({100, 1})->Args({1000, 1})->Args({10000, 1});
+template <class T = double, class Window>
+void Register(const std::string& name, Window window, std::initializer_list<int32_t> lengths = {1000, 1000000}) {
+    auto* const benchmark =
+        benchmark::RegisterBenchmark(name.c_str(), [=](benchmark::State& state) { Measure<T>(state, window); });
+    for (const int32_t n : lengths) benchmark->ArgName("n")->Arg(n);
 }
 
 // What a window costs that calls a cosine for each sample.
-template <class T>
-void CosinePerSample(T* x, int32_t n) {
+void CosinePerSample(double* x, int32_t n) {
     for (int32_t i = 0; i < n; ++i) x[i] *= 0.5 - 0.5 * std::cos(2.0 * kPi * i / n);
 }
 
-// The same weights for all arrays of a length.
-const double* Precomputed(int32_t n) {
-    static std::vector<double> weights;
-    if (weights.size() < static_cast<std::size_t>(n)) weights.assign(static_cast<std::size_t>(n), 0.999);
-    return weights.data();
+void Multiply(double* x, int32_t n) {
+    static const std::vector<double> weights(1000000, 0.999);
+    MultiplyByWeights(x, weights.data(), n);
 }
 
-#define WINDOW_BENCHMARK(name, arguments, call)                              \
-    void name(benchmark::State& state) {                                     \
-        Measure<double>(state, [](double* x, int32_t n) { return call; });   \
-    }                                                                        \
-    BENCHMARK(name)->Apply(arguments);                                       \
-    void Cx##name(benchmark::State& state) {                                 \
-        Measure<Complex>(state, [](Complex* x, int32_t n) { return call; }); \
-    }                                                                        \
-    BENCHMARK(Cx##name)->Apply(arguments)
-
-WINDOW_BENCHMARK(Multiply, CachedAndNot, MultiplyByWeights(x, Precomputed(n), n));
-WINDOW_BENCHMARK(HannByCosinePerSample, CachedAndNot, CosinePerSample(x, n));
-WINDOW_BENCHMARK(Hann, CachedAndNot, NamedCosineWindow(x, n, kWindowHann, false));
-WINDOW_BENCHMARK(Blackman, CachedAndNot, NamedCosineWindow(x, n, kWindowBlackman, false));
-WINDOW_BENCHMARK(BlackmanHarris4, CachedAndNot, NamedCosineWindow(x, n, kWindowBlackmanHarris4, false));
-WINDOW_BENCHMARK(FlatTop, CachedAndNot, NamedCosineWindow(x, n, kWindowFlatTop, false));
-WINDOW_BENCHMARK(BlackmanHarris7, CachedAndNot, NamedCosineWindow(x, n, kWindowBlackmanHarris7, false));
-WINDOW_BENCHMARK(BartlettHanning, Cached, BartlettHanningWindow(x, n));
-WINDOW_BENCHMARK(Bohman, Cached, BohmanWindow(x, n));
-WINDOW_BENCHMARK(Parzen, Cached, ParzenWindow(x, n));
-WINDOW_BENCHMARK(Welch, Cached, WelchWindow(x, n));
-WINDOW_BENCHMARK(Triangle, Cached, TriangleWindow(x, n));
-WINDOW_BENCHMARK(Taper, Cached, CosineTaper(x, n, 0.2));
-WINDOW_BENCHMARK(Exponential, Cached, ExponentialWindow(x, n, 0.1));
-WINDOW_BENCHMARK(Force, Cached, ForceWindow(x, n, 50.0));
-WINDOW_BENCHMARK(Kaiser, Cached, KaiserWindow(x, n, 6.0));
-WINDOW_BENCHMARK(Gaussian, Cached, GaussianWindow(x, n, 0.2, false));
-WINDOW_BENCHMARK(DolphChebyshev, Quadratic, DolphChebyshevWindow(x, n, 1e4, false));
+const bool kRegistered = [] {
+    struct Named {
+        const char* name;
+        int32_t type;
+    };
+    const Named cosine_sums[] = {{"Hann", kWindowHann},
+                                 {"Blackman", kWindowBlackman},
+                                 {"Blackman-Harris 4", kWindowBlackmanHarris4},
+                                 {"flat top", kWindowFlatTop},
+                                 {"Blackman-Harris 7", kWindowBlackmanHarris7}};
+    Register("multiplication/plain loop", Multiply);
+    Register("Hann/std::cos", CosinePerSample);
+    for (const auto& [name, type] : cosine_sums) {
+        const auto window = [type = type](auto* x, int32_t n) { NamedCosineWindow(x, n, type, false); };
+        Register(std::string(name) + "/krnumer", window);
+        Register<Complex>(std::string(name) + ", complex/krnumer", window);
+    }
+    Register("Bartlett-Hann/krnumer", [](double* x, int32_t n) { BartlettHanningWindow(x, n); });
+    Register("Bohman/krnumer", [](double* x, int32_t n) { BohmanWindow(x, n); });
+    Register("Parzen/krnumer", [](double* x, int32_t n) { ParzenWindow(x, n); });
+    Register("Welch/krnumer", [](double* x, int32_t n) { WelchWindow(x, n); });
+    Register("triangle/krnumer", [](double* x, int32_t n) { TriangleWindow(x, n); });
+    Register("cosine taper/krnumer", [](double* x, int32_t n) { CosineTaper(x, n, 0.2); });
+    Register("exponential/krnumer", [](double* x, int32_t n) { ExponentialWindow(x, n, 0.1); });
+    Register("force/krnumer", [](double* x, int32_t n) { ForceWindow(x, n, 50.0); });
+    Register("Kaiser/krnumer", [](double* x, int32_t n) { KaiserWindow(x, n, 6.0); });
+    Register("Gaussian/krnumer", [](double* x, int32_t n) { GaussianWindow(x, n, 0.2, false); });
+    Register("Dolph-Chebyshev/krnumer", [](double* x, int32_t n) { DolphChebyshevWindow(x, n, 1e4, false); },
+             {100, 1000});
+    return true;
+}();
 
 }  // namespace
 }  // namespace krnumer
