@@ -34,7 +34,8 @@ Report Analyse(const Recording& ecg) {
         "Record 208 of the MIT-BIH Arrhythmia Database, lead MLII, from 19:35 on; PhysioNet, Open Data Commons "
         "Attribution License 1.0. G. B. Moody and R. G. Mark, IEEE Eng. in Med. and Biol. 20(3):45-50 (2001); A. L. "
         "Goldberger et al., Circulation 101(23):e215-e220 (2000).";
-    for (const auto section : {SignalSection, StatisticsSection, WavesSection, WindowsSection, RhythmSection}) {
+    for (const auto section : {SignalSection, StatisticsSection, WavesSection, WindowsSection, SpectrumSection,
+                               RhythmSection, FilterSection, BeatSection, MeasurementSection}) {
         report.sections.push_back(section(ecg));
     }
     return report;

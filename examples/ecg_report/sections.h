@@ -21,8 +21,21 @@ struct Recording {
     }
 };
 
+// A statistic that is one number of an array, and the central moment of an order.
+double Statistic(int32_t (*statistic)(KrHandle, double*, int32_t*), const char* name, const Array<double>& x);
+double Moment(const Array<double>& x, int32_t order);
+
+// The recording less its baseline, a running median, in mV.
+Array<double> WithoutBaseline(const Recording& ecg);
+// And filtered until nothing but a hill for each beat is left.
+Array<double> BeatsAlone(const Recording& ecg);
+
 Section SignalSection(const Recording& ecg);
 Section StatisticsSection(const Recording& ecg);
 Section WavesSection(const Recording& ecg);
 Section WindowsSection(const Recording& ecg);
+Section SpectrumSection(const Recording& ecg);
 Section RhythmSection(const Recording& ecg);
+Section FilterSection(const Recording& ecg);
+Section BeatSection(const Recording& ecg);
+Section MeasurementSection(const Recording& ecg);

@@ -6,23 +6,6 @@
 
 namespace {
 
-// A statistic that is one number of an array.
-double Statistic(int32_t (*statistic)(KrHandle, double*, int32_t*), const char* name, const Array<double>& x) {
-    double value = 0.0;
-    int32_t err = 0;
-    statistic(x.handle(), &value, &err);
-    Check(err, name);
-    return value;
-}
-
-double Moment(const Array<double>& x, int32_t order) {
-    double value = 0.0;
-    int32_t err = 0;
-    Moment_head(x.handle(), &order, &value, &err);
-    Check(err, "Moment_head");
-    return value;
-}
-
 // The share of samples in bands that matter to a reader, by a histogram with intervals of its own.
 Table Bands(const Array<double>& x) {
     constexpr std::array<const char*, 4> kNames = {"below -1 mV", "-1 mV to 0", "0 to 1 mV", "above 1 mV"};
@@ -46,6 +29,22 @@ Table Bands(const Array<double>& x) {
 }
 
 }  // namespace
+
+double Statistic(int32_t (*statistic)(KrHandle, double*, int32_t*), const char* name, const Array<double>& x) {
+    double value = 0.0;
+    int32_t err = 0;
+    statistic(x.handle(), &value, &err);
+    Check(err, name);
+    return value;
+}
+
+double Moment(const Array<double>& x, int32_t order) {
+    double value = 0.0;
+    int32_t err = 0;
+    Moment_head(x.handle(), &order, &value, &err);
+    Check(err, "Moment_head");
+    return value;
+}
 
 Section StatisticsSection(const Recording& ecg) {
     const Array<double>& x = ecg.millivolt;

@@ -48,10 +48,7 @@ Section WindowsSection(const Recording& ecg) {
 
     constexpr double kFrom = 10.0, kTo = 16.0;
     Array<double> part(ecg.Between(kFrom, kTo));
-    double mean = 0.0;
-    int32_t err = 0;
-    Mean_head(part.handle(), &mean, &err);
-    Check(err, "Mean_head");
+    const double mean = Statistic(Mean_head, "Mean_head", part);
     for (double& sample : part.values()) sample -= mean;
     Array<double> windowed(part);
     constexpr int32_t kHann = 1, kScaled = 0;

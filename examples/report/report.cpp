@@ -42,6 +42,10 @@ Series Mark(const std::string& name, double x) {
     return {"mark", name, {x}, {}};
 }
 
+Series Level(const std::string& name, double y) {
+    return {"level", name, {}, {y}};
+}
+
 std::string Number(double value, int digits) {
     std::ostringstream text;
     text << std::fixed << std::setprecision(digits) << value;

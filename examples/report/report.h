@@ -10,7 +10,8 @@
 
 // One curve of a plot.
 struct Series {
-    std::string kind;  // "line", "points", "columns", "band" from y to upper, or "mark", a vertical line at each x
+    std::string kind;  // "line", "points", "columns", "band" from y to upper, "mark", a vertical line at each x, or
+                       // "level", a horizontal one at each y
     std::string name;
     std::vector<double> x, y;
     std::vector<double> upper = {};
@@ -24,6 +25,7 @@ Series Columns(const std::string& name, std::span<const double> centers, std::sp
 Series Band(const std::string& name, std::span<const double> x, std::span<const double> lower,
             std::span<const double> upper);
 Series Mark(const std::string& name, double x);
+Series Level(const std::string& name, double y);
 
 struct Plot {
     std::string title;
