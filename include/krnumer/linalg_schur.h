@@ -15,10 +15,10 @@
 /**
  * Hessenberg form, A = Q H Q^H, H upper Hessenberg between two rows.
  *
- * @param[in,out] a    matrix; H on return
+ * @param[in,out] a    n by n; H on return
  * @param[in]     ilo  first row of the part to reduce, from 0 on
  * @param[in]     ihi  last row of it, from ilo on
- * @param[out]    q    orthogonal or unitary factor
+ * @param[out]    q    n by n, orthogonal or unitary
  * @return             0; -20040 when `a` is not square; -20003 when it is empty; -20017 unless 0 <= ilo <= ihi < n;
  *                     -20068 for data that cannot be used; -20001 without memory or when `q` cannot be sized
  */
@@ -68,9 +68,9 @@ KRNUMER_API int32_t CxEigenVBack_head(KrHandle v, int32_t job, int32_t side, int
  * @param[in]     wantVectors  not 0 for Z
  * @param[out]    z            orthogonal or unitary factor; empty when it is not wanted
  * @param[out]    w            eigenvalues, 1-D complex
- * @return                     0; -20003 when `a` is empty; -20040 when it is not square; -20061 for another order;
- *                             -20068 for data that cannot be used; -20062 without convergence; -20999 when LAPACK
- *                             fails; -20001 without memory or when an output cannot be sized
+ * @return                     0; -20003 when `a` is empty; -20040 when it is not square; -20068 for data that cannot be
+ *                             used; -20062 without convergence; -20999 when LAPACK fails; -20001 without memory or when
+ *                             an output cannot be sized
  */
 KRNUMER_API int32_t Schur_head(KrHandle a, int32_t wantVectors, KrHandle z, KrHandle w);
 
@@ -105,9 +105,9 @@ KRNUMER_API int32_t CxSchur80_head(KrHandle a, int32_t wantVectors, int32_t orde
  * @param[out]    beta   denominators, 1-D of double, or complex
  * @param[out]    v      right eigenvectors as columns, 2-D complex; the largest |re| + |im| of each is 1
  * @return               0; -20040 when a matrix is not square; -20070 when they differ in size; -20003 when they are
- *                       empty; -20061 for another order; -20068 for data that cannot be used; -20062 without
- *                       convergence; -20073 when pairs cannot be exchanged; -20999 when LAPACK fails; -20001 without
- *                       memory or when an output cannot be sized
+ *                       empty; -20068 for data that cannot be used; -20062 without convergence; -20073 when pairs
+ *                       cannot be exchanged; -20999 when LAPACK fails; -20001 without memory or when an output cannot
+ *                       be sized
  */
 KRNUMER_API int32_t QZ_head(KrHandle a, KrHandle b, KrHandle alpha, KrHandle beta, KrHandle v);
 
