@@ -5,7 +5,9 @@
 
 #include "frame/numeric.h"
 #include "frame/status.h"
+#include "linalg/delayed_sweeps.h"
 #include "linalg/element.h"
+#include "linalg/rotation_chain.h"
 #include "linalg/rotations.h"
 
 namespace krnumer {
@@ -22,18 +24,37 @@ Complex SquareRoot(Complex z) {
     return {std::fabs(smaller), std::copysign(larger, z.im)};
 }
 
+// What a sweep does to the transformation.
+struct SingleShiftSweep {
+    using Link = ComplexRotation;
+
+    RotationChain chain;
+    std::ptrdiff_t first;
+    Complex phase;  // of the last column
+    bool has_phase;
+
+    void ApplyTo(Complex* columns, std::ptrdiff_t stride, std::ptrdiff_t width) const {
+        RotateTransposedByChain(chain, columns + first * stride, stride, width);
+        if (!has_phase) return;
+        Complex* const last = columns + (first + chain.count) * stride;
+        for (std::ptrdiff_t i = 0; i < width; ++i) last[i] *= phase;
+    }
+};
+
 class Iteration {
   public:
-    Iteration(const ComplexHessenberg& problem, Complex* w, Complex* work)
-        : h_(problem.h),
-          n_(problem.n),
-          low_(problem.low),
-          columns_(problem.columns),
-          norm_(problem.norm),
-          w_(w),
-          cosines_(work),
-          sines_(reinterpret_cast<double*>(work + problem.n)) {}
+    Iteration(const ComplexHessenberg& problem, Complex* w)
+        : h_(problem.h), n_(problem.n), low_(problem.low), columns_(problem.columns), norm_(problem.norm), w_(w) {}
 
+    int32_t Run(std::ptrdiff_t high) {
+        if (!sweeps_.Start(columns_, n_)) return kOutOfMemory;
+        for (std::ptrdiff_t en = high; en >= low_; --en)
+            if (const int32_t status = Converge(en)) return status;
+        sweeps_.Apply();
+        return kOk;
+    }
+
+  private:
     // Sweeps until an eigenvalue separates at en.
     int32_t Converge(std::ptrdiff_t en) {
         for (int32_t sweeps = 0;; ++sweeps) {
@@ -47,7 +68,6 @@ class Iteration {
         return kOk;
     }
 
-  private:
     Complex& At(std::ptrdiff_t i, std::ptrdiff_t j) { return h_[i * n_ + j]; }
 
     // Where the unreduced block that ends at en begins.
@@ -80,65 +100,70 @@ class Iteration {
     void Sweep(std::ptrdiff_t l, std::ptrdiff_t en, Complex shift) {
         for (std::ptrdiff_t i = low_; i <= en; ++i) At(i, i) -= shift;
         shifted_ += shift;
-        ReduceRows(l, en);
+        const RotationChain chain = ReduceRows(l, en);
         const Complex last = At(en, en);
-        const Complex phase = last.im != 0.0 ? last / Hypotenuse(last.re, last.im) : Complex{1.0, 0.0};
-        if (last.im != 0.0) {
+        const bool has_phase = last.im != 0.0;
+        const Complex phase = has_phase ? last / Hypotenuse(last.re, last.im) : Complex{1.0, 0.0};
+        if (has_phase) {
             At(en, en) = {Hypotenuse(last.re, last.im), 0.0};
             for (std::ptrdiff_t j = en + 1; j < LastColumn(en); ++j) At(en, j) = Conjugate(phase) * At(en, j);
         }
-        RotateColumns(l, en);
-        if (last.im != 0.0) {
+        RotateColumns(chain, l);
+        if (has_phase)
             for (std::ptrdiff_t i = FirstRow(l); i <= en; ++i) At(i, en) *= phase;
-            if (columns_ != nullptr)
-                for (std::ptrdiff_t i = 0; i < n_; ++i) columns_[en * n_ + i] *= phase;
-        }
+        sweeps_.Add({chain, l, phase, has_phase});
     }
 
     // The rows and columns that the eigenvalues alone need are those of the block.
     std::ptrdiff_t LastColumn(std::ptrdiff_t en) const { return columns_ != nullptr ? n_ : en + 1; }
     std::ptrdiff_t FirstRow(std::ptrdiff_t l) const { return columns_ != nullptr ? 0 : l; }
 
-    // Makes the block triangular by rotations of rows i - 1 and i.
-    void ReduceRows(std::ptrdiff_t l, std::ptrdiff_t en) {
-        for (std::ptrdiff_t i = l + 1; i <= en; ++i) {
-            const Complex diagonal = At(i - 1, i - 1);
-            const double below = At(i, i - 1).re;
-            const double length = Hypotenuse(Hypotenuse(diagonal.re, diagonal.im), below);
-            const Complex c = diagonal / length;
+    // Makes the block triangular. The rotations meet a few columns at once; the columns from `front` on wait until the
+    // next rotation depends on them, or to the end.
+    RotationChain ReduceRows(std::ptrdiff_t l, std::ptrdiff_t en) {
+        constexpr std::ptrdiff_t kStrip = 16;
+        ComplexRotation* const rotations = sweeps_.NextLinks();
+        std::ptrdiff_t front = l;
+        const auto advance = [&](std::ptrdiff_t done, std::ptrdiff_t to) {
+            RotateRowsByChain({rotations, done}, &At(l, front), n_, to - front);
+            front = to;
+        };
+        for (std::ptrdiff_t k = 0; k < en - l; ++k) {
+            const std::ptrdiff_t i = l + k;
+            if (i == front) advance(k, std::min(front + kStrip, LastColumn(en)));
+            Complex* const upper = &At(i, 0);
+            Complex* const lower = &At(i + 1, 0);
+            const double below = lower[i].re;
+            const double length = Hypotenuse(Hypotenuse(upper[i].re, upper[i].im), below);
+            const Complex c = upper[i] / length;
             const double s = below / length;
-            cosines_[i] = c;
-            sines_[i] = s;
-            At(i - 1, i - 1) = {length, 0.0};
-            At(i, i - 1) = {};
-            Complex* upper = &At(i - 1, 0);
-            Complex* lower = &At(i, 0);
-            for (std::ptrdiff_t j = i; j < LastColumn(en); ++j) {
+            rotations[k] = {c, s};
+            upper[i] = {length, 0.0};
+            lower[i] = {};
+            for (std::ptrdiff_t j = i + 1; j < front; ++j) {
                 const Complex y = upper[j], z = lower[j];
                 upper[j] = Conjugate(c) * y + s * z;
                 lower[j] = c * z - s * y;
             }
         }
+        advance(en - l, LastColumn(en));
+        return {rotations, en - l};
     }
 
-    // The inverse rotations from the right: row by row for the matrix, and on the rows that hold the columns of the
-    // transformation.
-    void RotateColumns(std::ptrdiff_t l, std::ptrdiff_t en) {
-        for (std::ptrdiff_t i = FirstRow(l); i <= en; ++i) {
-            Complex* row = &At(i, 0);
-            for (std::ptrdiff_t j = std::max(l + 1, i); j <= en; ++j) Rotate(j, &row[j - 1], &row[j]);
+    // The inverse rotations from the right, on all rows down to the place of each.
+    void RotateColumns(const RotationChain& chain, std::ptrdiff_t l) {
+        const std::ptrdiff_t top = FirstRow(l);
+        RotateColumnsByChain(chain, &At(top, l), n_, l + 1 - top);
+        // Row l + k starts at rotation k - 1; a few rows are brought to the same one, then they go on together.
+        constexpr std::ptrdiff_t kTogether = 16;
+        for (std::ptrdiff_t k = 0; k < chain.count; k += kTogether) {
+            const std::ptrdiff_t rows = std::min(kTogether, chain.count - k);
+            const std::ptrdiff_t common = k + rows - 1;
+            for (std::ptrdiff_t j = k; j < common; ++j)
+                RotateColumnsByChain({chain.rotations + j, common - j}, &At(l + j + 1, l + j), n_, 1);
+            RotateColumnsByChain({chain.rotations + common, chain.count - common}, &At(l + k + 1, l + common), n_,
+                                 rows);
         }
-        if (columns_ == nullptr) return;
-        for (std::ptrdiff_t j = l + 1; j <= en; ++j) {
-            Complex* left = columns_ + (j - 1) * n_;
-            for (std::ptrdiff_t i = 0; i < n_; ++i) Rotate(j, &left[i], &left[n_ + i]);
-        }
-    }
-
-    void Rotate(std::ptrdiff_t j, Complex* left, Complex* right) const {
-        const Complex y = *left, z = *right;
-        *left = cosines_[j] * y + sines_[j] * z;
-        *right = Conjugate(cosines_[j]) * z - sines_[j] * y;
     }
 
     Complex* h_;
@@ -147,20 +172,16 @@ class Iteration {
     Complex* columns_;
     double norm_;
     Complex* w_;
-    Complex* cosines_;
-    double* sines_;
+    DelayedSweeps<Complex, SingleShiftSweep> sweeps_;
     Complex shifted_{};  // sum of all shifts, taken off the diagonal
 };
 
 }  // namespace
 
-int32_t ReduceToComplexSchur(const ComplexHessenberg& problem, Complex* w, Complex* work) {
+int32_t ReduceToComplexSchur(const ComplexHessenberg& problem, Complex* w) {
     for (std::ptrdiff_t i = 0; i < problem.n; ++i)
         if (i < problem.low || i > problem.high) w[i] = problem.h[i * (problem.n + 1)];
-    Iteration iteration(problem, w, work);
-    for (std::ptrdiff_t en = problem.high; en >= problem.low; --en)
-        if (const int32_t status = iteration.Converge(en)) return status;
-    return kOk;
+    return Iteration(problem, w).Run(problem.high);
 }
 
 }  // namespace krnumer

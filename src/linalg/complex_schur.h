@@ -23,7 +23,7 @@ struct ComplexHessenberg {
 };
 
 // w receives the eigenvalues where the iteration leaves them. Where the transformation is wanted, h becomes triangular,
-// with what is left of the small elements below its diagonal. work: 2 n. -20062 when the iteration does not end.
-int32_t ReduceToComplexSchur(const ComplexHessenberg& problem, Complex* w, Complex* work);
+// with what is left of the small elements below its diagonal. -20062 when the iteration does not end; -20001.
+int32_t ReduceToComplexSchur(const ComplexHessenberg& problem, Complex* w);
 
 }  // namespace krnumer

@@ -102,7 +102,7 @@ int32_t CxEigenGeneralCore(const Complex* a, int32_t order, int32_t want_vectors
     for (std::ptrdiff_t i = 0; i < n; ++i)
         for (std::ptrdiff_t j = std::max<std::ptrdiff_t>(i - 1, 0); j < n; ++j) norm += SumOfParts(h.data()[i * n + j]);
     const ComplexHessenberg problem{h.data(), n, balance.low, balance.high, columns, norm};
-    if (const int32_t status = ReduceToComplexSchur(problem, w, work)) return status;
+    if (const int32_t status = ReduceToComplexSchur(problem, w)) return status;
     if (columns == nullptr) return kOk;
 
     // Row by row from the end the Schur form gives way to the eigenvectors.

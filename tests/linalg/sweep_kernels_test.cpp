@@ -5,9 +5,11 @@
 #include <cmath>
 #include <vector>
 
+#include "linalg/matrices.h"
 #include "linalg/reflector_chain.h"
+#include "linalg/rotation_chain.h"
 #include "linalg/rotations.h"
-#include "linalg/test_matrices.h"
+#include "support/vector_units.h"
 
 namespace krnumer {
 namespace {
@@ -71,18 +73,56 @@ TEST(ReflectorChain, ReflectsTriplesOneAfterTheOther) {
         const ReflectorChain chain{reflectors.data(), count, ends_short};
         for (const int32_t width : kWidths) {
             const DenseMatrix<double> a = RandomMatrix<double>(kRows, width, 4);
-            DenseMatrix<double> left = a, right = a, expected_left = a, expected_right = a, across = Adjoint(a);
-            ReflectRowsByChain(chain, left.data(), width, width);
-            ReflectTransposedByChain(chain, right.data(), width, width);
-            ReflectColumnsByChain(chain, across.data(), kRows, width);
+            DenseMatrix<double> expected_left = a, expected_right = a;
             for (int32_t k = 0; k < count; ++k) {
                 const bool is_short = ends_short && k == count - 1;
                 Reflect(reflectors[Count(k)], true, is_short, k, &expected_left);
                 Reflect(reflectors[Count(k)], false, is_short, k, &expected_right);
             }
-            EXPECT_EQ(left, expected_left) << width;
-            EXPECT_EQ(right, expected_right) << width;
-            EXPECT_EQ(Adjoint(across), expected_right) << width;
+            OnEveryVectorUnit([&] {
+                DenseMatrix<double> left = a, right = a, across = Adjoint(a);
+                ReflectRowsByChain(chain, left.data(), width, width);
+                ReflectTransposedByChain(chain, right.data(), width, width);
+                ReflectColumnsByChain(chain, across.data(), kRows, width);
+                EXPECT_EQ(left, expected_left) << width;
+                EXPECT_EQ(right, expected_right) << width;
+                EXPECT_EQ(Adjoint(across), expected_right) << width;
+            });
+        }
+    }
+}
+
+TEST(RotationChain, RotatesComplexPairsOneAfterTheOther) {
+    constexpr int32_t kLong = 70;  // several tiles
+    RandomBits bits(5);
+    std::vector<ComplexRotation> rotations(kLong - 1);
+    for (ComplexRotation& r : rotations) r = {RandomElement<Complex>(bits), Uniform(bits)};
+    for (const int32_t height : {2, 9, kLong}) {
+        const RotationChain chain{rotations.data(), height - 1};
+        for (const int32_t width : kWidths) {
+            const DenseMatrix<Complex> a = RandomMatrix<Complex>(height, width, 6);
+            DenseMatrix<Complex> expected_left = a, expected_right = a;
+            for (int32_t k = 0; k < height - 1; ++k) {
+                const auto [c, s] = rotations[Count(k)];
+                const auto rotate = [k](Complex cosine, double sine, DenseMatrix<Complex>* b) {
+                    for (int32_t j = 0; j < b->columns; ++j) {
+                        const Complex y = (*b)(k, j), z = (*b)(k + 1, j);
+                        (*b)(k, j) = cosine * y + sine * z;
+                        (*b)(k + 1, j) = Conjugate(cosine) * z - sine * y;
+                    }
+                };
+                rotate(Conjugate(c), s, &expected_left);
+                rotate(c, s, &expected_right);
+            }
+            OnEveryVectorUnit([&] {
+                DenseMatrix<Complex> left = a, right = a, across = Transposed(a);
+                RotateRowsByChain(chain, left.data(), width, width);
+                RotateTransposedByChain(chain, right.data(), width, width);
+                RotateColumnsByChain(chain, across.data(), height, width);
+                EXPECT_EQ(left, expected_left) << width;
+                EXPECT_EQ(right, expected_right) << width;
+                EXPECT_EQ(Transposed(across), expected_right) << width;
+            });
         }
     }
 }
