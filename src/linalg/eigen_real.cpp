@@ -103,9 +103,8 @@ int32_t EigenGeneralCore(const double* a, int32_t order, int32_t want_vectors, C
 
     const std::ptrdiff_t n = order;
     Scratch<double> h(Count(order) * (Count(order) + 3));
-    Scratch<BulgeReflector> reflectors(Count(order));
     Scratch<int32_t> exchanged(Count(order));
-    if (!h || !reflectors || !exchanged) return kOutOfMemory;
+    if (!h || !exchanged) return kOutOfMemory;
     double* scale = h.data() + n * n;
     double* work = scale + n;  // 2 n
 
@@ -119,7 +118,7 @@ int32_t EigenGeneralCore(const double* a, int32_t order, int32_t want_vectors, C
     }
     const double norm = HessenbergNorm(h.data(), n);
     const RealHessenberg problem{h.data(), n, balance.low, balance.high, columns, norm};
-    if (const int32_t status = ReduceToRealSchur(problem, w, reflectors.data())) return status;
+    if (const int32_t status = ReduceToRealSchur(problem, w)) return status;
     if (want_vectors == 0) return kOk;
 
     // Row by row from the end the Schur form gives way to the eigenvectors.

@@ -5,6 +5,7 @@
 
 #include "frame/numeric.h"
 #include "frame/status.h"
+#include "linalg/delayed_sweeps.h"
 #include "linalg/reflector_chain.h"
 #include "linalg/rotations.h"
 
@@ -12,17 +13,32 @@ namespace krnumer {
 
 namespace {
 
+// What a sweep does to the transformation.
+struct DoubleShiftSweep {
+    using Link = BulgeReflector;
+
+    ReflectorChain chain;
+    std::ptrdiff_t first;
+
+    void ApplyTo(double* columns, std::ptrdiff_t stride, std::ptrdiff_t width) const {
+        ReflectTransposedByChain(chain, columns + first * stride, stride, width);
+    }
+};
+
 class Iteration {
   public:
-    Iteration(const RealHessenberg& problem, Complex* w, BulgeReflector* reflectors)
-        : h_(problem.h),
-          n_(problem.n),
-          low_(problem.low),
-          columns_(problem.columns),
-          norm_(problem.norm),
-          w_(w),
-          reflectors_(reflectors) {}
+    Iteration(const RealHessenberg& problem, Complex* w)
+        : h_(problem.h), n_(problem.n), low_(problem.low), columns_(problem.columns), norm_(problem.norm), w_(w) {}
 
+    int32_t Run(std::ptrdiff_t high) {
+        if (!sweeps_.Start(columns_, n_)) return kOutOfMemory;
+        for (std::ptrdiff_t en = high; en >= low_;)
+            if (const int32_t status = Converge(&en)) return status;
+        sweeps_.Apply();
+        return kOk;
+    }
+
+  private:
     // Sweeps until one eigenvalue or a pair separates at the end of the block up to `en`; low up to en - 1 or en - 2 is
     // left then.
     int32_t Converge(std::ptrdiff_t* en_left) {
@@ -45,7 +61,6 @@ class Iteration {
         }
     }
 
-  private:
     // The two shifts as the roots of (s - x) (s - y) = w.
     struct Shift {
         double x, y, w;
@@ -105,18 +120,28 @@ class Iteration {
         const std::ptrdiff_t m = start.row;
         for (std::ptrdiff_t i = m + 2; i <= en; ++i) At(i, i - 2) = 0.0;
         for (std::ptrdiff_t i = m + 3; i <= en; ++i) At(i, i - 3) = 0.0;
-        ChaseBulge(l, en, start);
-        ApplyOutside(l, m, en);
+        BulgeReflector* const reflectors = sweeps_.NextLinks();
+        ChaseBulge(l, en, start, reflectors);
+        ApplyOutside(l, m, en, reflectors);
+        sweeps_.Add({{reflectors, en - m, true}, m});
     }
 
-    // Within the block every reflector meets its rows at once, and from the right only the rows that the next
-    // reflectors need; what stands above them is left to ApplyOutside.
-    void ChaseBulge(std::ptrdiff_t l, std::ptrdiff_t en, const FirstColumn& start) {
+    // Within the block every reflector meets a few columns at once; those from `front` on wait until the next ones
+    // depend on them. From the right it meets only the rows that the next reflectors need; what stands above them is
+    // left to ApplyOutside.
+    void ChaseBulge(std::ptrdiff_t l, std::ptrdiff_t en, const FirstColumn& start, BulgeReflector* reflectors) {
+        constexpr std::ptrdiff_t kStrip = 32;
         const std::ptrdiff_t m = start.row;
+        std::ptrdiff_t front = m;
         double p = start.p, q = start.q, r = start.r;
         for (std::ptrdiff_t k = m; k < en; ++k) {
+            if (std::min(k + 2, en) >= front) {
+                const std::ptrdiff_t width = std::min(kStrip, en + 1 - front);
+                ReflectRowsByChain({reflectors, k - m, false}, Row(m) + front, n_, width);
+                front += width;
+            }
             const bool is_last = k == en - 1;
-            BulgeReflector& f = reflectors_[k - m];
+            BulgeReflector& f = reflectors[k - m];
             double x = 1.0;
             if (k > m) {
                 p = At(k, k - 1);
@@ -139,15 +164,15 @@ class Iteration {
             }
             p += s;
             f = {p / s, q / s, r / s, q / p, r / p};
-            ReflectInBlock(f, k, en);
+            ReflectInBlock(f, k, front, en);
         }
     }
 
-    void ReflectInBlock(const BulgeReflector& f, std::ptrdiff_t k, std::ptrdiff_t en) {
+    void ReflectInBlock(const BulgeReflector& f, std::ptrdiff_t k, std::ptrdiff_t front, std::ptrdiff_t en) {
         double* a = Row(k);
         double* b = Row(k + 1);
         if (k == en - 1) {
-            for (std::ptrdiff_t j = k; j <= en; ++j) {
+            for (std::ptrdiff_t j = k; j < front; ++j) {
                 const double p = a[j] + f.q * b[j];
                 a[j] -= p * f.x;
                 b[j] -= p * f.y;
@@ -158,7 +183,7 @@ class Iteration {
             return;
         }
         double* c = Row(k + 2);
-        for (std::ptrdiff_t j = k; j <= en; ++j) {
+        for (std::ptrdiff_t j = k; j < front; ++j) {
             const double p = a[j] + f.q * b[j] + f.r * c[j];
             a[j] -= p * f.x;
             b[j] -= p * f.y;
@@ -174,10 +199,10 @@ class Iteration {
     }
 
     // What the sweep on rows and columns m to en owes to the rest: the rows above, up to the place of each reflector,
-    // and with the transformation also the columns to the right and the transformation itself.
-    void ApplyOutside(std::ptrdiff_t l, std::ptrdiff_t m, std::ptrdiff_t en) {
+    // and with the transformation also the columns to the right.
+    void ApplyOutside(std::ptrdiff_t l, std::ptrdiff_t m, std::ptrdiff_t en, const BulgeReflector* reflectors) {
         const auto chain = [&](std::ptrdiff_t from, std::ptrdiff_t to) {
-            return ReflectorChain{reflectors_ + (from - m), to - from, to == en};
+            return ReflectorChain{reflectors + (from - m), to - from, to == en};
         };
         const std::ptrdiff_t top = columns_ != nullptr ? 0 : l;
         ReflectColumnsByChain(chain(m, en), Row(top) + m, n_, m + 1 - top);
@@ -189,9 +214,7 @@ class Iteration {
             for (std::ptrdiff_t j = i; j < common; ++j) ReflectColumnsByChain(chain(j, common), Row(j) + j, n_, 1);
             ReflectColumnsByChain(chain(common, en), Row(i) + common, n_, rows);
         }
-        if (columns_ == nullptr) return;
-        ReflectRowsByChain(chain(m, en), Row(m) + en + 1, n_, n_ - en - 1);
-        ReflectTransposedByChain(chain(m, en), columns_ + m * n_, n_, n_);
+        if (columns_ != nullptr) ReflectRowsByChain(chain(m, en), Row(m) + en + 1, n_, n_ - en - 1);
     }
 
     void StoreOne(std::ptrdiff_t en) {
@@ -236,6 +259,7 @@ class Iteration {
             row[na] = q * a + p * row[en];
             row[en] = q * row[en] - p * a;
         }
+        sweeps_.Apply();
         RotateRows(columns_ + na * n_, columns_ + en * n_, n_, q, p);
     }
 
@@ -245,19 +269,16 @@ class Iteration {
     double* columns_;
     double norm_;
     Complex* w_;
-    BulgeReflector* reflectors_;
+    DelayedSweeps<double, DoubleShiftSweep> sweeps_;
     double shifted_ = 0.0;  // sum of the exceptional shifts, taken off the diagonal
 };
 
 }  // namespace
 
-int32_t ReduceToRealSchur(const RealHessenberg& problem, Complex* w, BulgeReflector* work) {
+int32_t ReduceToRealSchur(const RealHessenberg& problem, Complex* w) {
     for (std::ptrdiff_t i = 0; i < problem.n; ++i)
         if (i < problem.low || i > problem.high) w[i] = {problem.h[i * problem.n + i], 0.0};
-    Iteration iteration(problem, w, work);
-    for (std::ptrdiff_t en = problem.high; en >= problem.low;)
-        if (const int32_t status = iteration.Converge(&en)) return status;
-    return kOk;
+    return Iteration(problem, w).Run(problem.high);
 }
 
 }  // namespace krnumer

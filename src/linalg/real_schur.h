@@ -6,7 +6,6 @@
 #include <cstdint>
 
 #include "frame/complex.h"
-#include "linalg/reflector_chain.h"
 
 namespace krnumer {
 
@@ -25,7 +24,7 @@ struct RealHessenberg {
 
 // w receives the eigenvalues where the iteration leaves them, of a conjugate pair first the one with positive imaginary
 // part. Where the transformation is wanted, h becomes a quasi-triangular matrix, with what is left of the small
-// elements below its blocks. work: n reflectors. -20062 when the iteration does not end.
-int32_t ReduceToRealSchur(const RealHessenberg& problem, Complex* w, BulgeReflector* work);
+// elements below its blocks. -20062 when the iteration does not end; -20001.
+int32_t ReduceToRealSchur(const RealHessenberg& problem, Complex* w);
 
 }  // namespace krnumer
