@@ -106,7 +106,7 @@ int32_t CxEigenGeneralCore(const Complex* a, int32_t order, int32_t want_vectors
     if (columns == nullptr) return kOk;
 
     // Row by row from the end the Schur form gives way to the eigenvectors.
-    SchurVectors(problem, w, work);
+    if (const int32_t status = SchurVectors(problem, w)) return status;
     for (std::ptrdiff_t j = 0; j < n; ++j) {
         Complex* x = h.data() + j * n;
         Unbalance(balance, n, x);

@@ -122,7 +122,7 @@ int32_t EigenGeneralCore(const double* a, int32_t order, int32_t want_vectors, C
     if (want_vectors == 0) return kOk;
 
     // Row by row from the end the Schur form gives way to the eigenvectors.
-    SchurVectors(problem, w, work);
+    if (const int32_t status = SchurVectors(problem, w)) return status;
     for (std::ptrdiff_t j = 0; j < n; ++j) {
         double* re = h.data() + j * n;
         Unbalance(balance, n, re);

@@ -5,7 +5,10 @@
 #include <limits>
 
 #include "frame/numeric.h"
+#include "frame/scratch.h"
+#include "frame/status.h"
 #include "linalg/element.h"
+#include "linalg/factor_kernels.h"
 
 namespace krnumer {
 
@@ -152,44 +155,100 @@ void SolveTriangular(const ComplexHessenberg& schur, const Complex* w, std::ptrd
     }
 }
 
-// out = the transformation times x[0 .. en]. Only rows and columns from low to high are other than the unit matrix.
+// Row j of h = x[0 .. extent], and zeros.
 template <class Hessenberg, class T>
-void Transform(const Hessenberg& schur, const T* x, std::ptrdiff_t en, T* out) {
-    std::copy_n(x, en + 1, out);
-    std::fill(out + en + 1, out + schur.n, T{});
-    const std::ptrdiff_t rows = schur.high - schur.low + 1;
-    if (rows < 1) return;
-    std::fill_n(out + schur.low, rows, T{});
-    for (std::ptrdiff_t k = schur.low; k <= std::min(en, schur.high); ++k) {
-        const T* column = schur.columns + k * schur.n + schur.low;
-        for (std::ptrdiff_t i = 0; i < rows; ++i) out[schur.low + i] += column[i] * x[k];
-    }
+void StoreRow(const Hessenberg& schur, const T* x, std::ptrdiff_t extent, std::ptrdiff_t j) {
+    T* const row = schur.h + j * schur.n;
+    std::copy_n(x, extent + 1, row);
+    std::fill(row + extent + 1, row + schur.n, T{});
 }
+
+// Multiplies the vectors, rows j of h up to extent(j), by the transformation, several at a time. Only its rows and
+// columns from low to high are other than those of the unit matrix.
+template <class T>
+class Transformation {
+  public:
+    template <class Hessenberg>
+    explicit Transformation(const Hessenberg& schur)
+        : h_(schur.h), columns_(schur.columns), n_(schur.n), low_(schur.low), end_(schur.high + 1) {}
+
+    template <class Extent>
+    int32_t Apply(Extent extent) {
+        if (low_ >= end_) return kOk;
+        if (!negated_.Allocate(static_cast<std::size_t>(kGroup * n_))) return kOutOfMemory;
+        const auto end_of = [&](std::ptrdiff_t j) { return std::min(extent(j) + 1, end_); };
+        for (std::ptrdiff_t first = 0; first < n_; first += kGroup) {
+            const std::ptrdiff_t count = std::min(kGroup, n_ - first);
+            group_ = h_ + first * n_;
+            std::transform(group_, group_ + count * n_, negated_.data(), [](T x) { return -x; });
+            for (std::ptrdiff_t i = 0; i < count; ++i) std::fill(group_ + i * n_ + low_, group_ + i * n_ + end_, T{});
+            const std::ptrdiff_t common = std::max(end_of(first), low_);
+            AddColumns(0, count, low_, common);
+            for (std::ptrdiff_t i = 1; i < count; ++i) AddColumns(i, 1, common, end_of(first + i));
+        }
+        return kOk;
+    }
+
+  private:
+    static constexpr std::ptrdiff_t kGroup = 16;
+
+    // To each of the rows, from `row` of the group on, columns first .. end - 1 times its elements.
+    void AddColumns(std::ptrdiff_t row, std::ptrdiff_t rows, std::ptrdiff_t first, std::ptrdiff_t end) {
+        if (first >= end) return;
+        const auto n = static_cast<std::size_t>(n_);
+        SubtractProduct(ProductOperands<T>{.c = group_ + row * n_ + low_,
+                                           .c_row = {n},
+                                           .a = negated_.data() + row * n_ + first,
+                                           .a_row = n,
+                                           .a_term = {1},
+                                           .b = columns_ + first * n_ + low_,
+                                           .b_term = {n},
+                                           .rows = static_cast<std::size_t>(rows),
+                                           .columns = static_cast<std::size_t>(end_ - low_),
+                                           .terms = static_cast<std::size_t>(end - first)});
+    }
+
+    T* h_;
+    const T* columns_;
+    std::ptrdiff_t n_;
+    std::ptrdiff_t low_;
+    std::ptrdiff_t end_;
+    T* group_ = nullptr;
+    Scratch<T> negated_;  // the rows of the group
+};
 
 }  // namespace
 
-void SchurVectors(const RealHessenberg& schur, const Complex* w, double* work) {
+int32_t SchurVectors(const RealHessenberg& schur, const Complex* w) {
+    const std::ptrdiff_t n = schur.n;
+    Scratch<double> vectors(static_cast<std::size_t>(2 * n));
+    if (!vectors) return kOutOfMemory;
     BackSubstitution substitution(schur, w);
-    double* x = work;
-    double* y = work + schur.n;
-    for (std::ptrdiff_t en = schur.n - 1; en >= 0; --en) {
+    double* x = vectors.data();
+    double* y = x + n;
+    for (std::ptrdiff_t en = n - 1; en >= 0; --en) {
         if (w[en].im == 0.0) {
             substitution.SolveReal(en, x);
-            Transform(schur, x, en, schur.h + en * schur.n);
+            StoreRow(schur, x, en, en);
         } else {
             substitution.SolvePair(en, x, y);
-            Transform(schur, x, en, schur.h + (en - 1) * schur.n);
-            Transform(schur, y, en, schur.h + en * schur.n);
+            StoreRow(schur, x, en, en - 1);
+            StoreRow(schur, y, en, en);
             --en;
         }
     }
+    return Transformation<double>(schur).Apply([w](std::ptrdiff_t j) { return w[j].im > 0.0 ? j + 1 : j; });
 }
 
-void SchurVectors(const ComplexHessenberg& schur, const Complex* w, Complex* work) {
-    for (std::ptrdiff_t en = schur.n - 1; en >= 0; --en) {
-        SolveTriangular(schur, w, en, work);
-        Transform(schur, work, en, schur.h + en * schur.n);
+int32_t SchurVectors(const ComplexHessenberg& schur, const Complex* w) {
+    const std::ptrdiff_t n = schur.n;
+    Scratch<Complex> x(static_cast<std::size_t>(n));
+    if (!x) return kOutOfMemory;
+    for (std::ptrdiff_t en = n - 1; en >= 0; --en) {
+        SolveTriangular(schur, w, en, x.data());
+        StoreRow(schur, x.data(), en, en);
     }
+    return Transformation<Complex>(schur).Apply([](std::ptrdiff_t j) { return j; });
 }
 
 }  // namespace krnumer
