@@ -207,7 +207,7 @@ class Iteration {
         const std::ptrdiff_t top = columns_ != nullptr ? 0 : l;
         ReflectColumnsByChain(chain(m, en), Row(top) + m, n_, m + 1 - top);
         // Row i starts at reflector i; a few rows are brought to the same one, then they go on together.
-        constexpr std::ptrdiff_t kTogether = 4;
+        constexpr std::ptrdiff_t kTogether = 8;
         for (std::ptrdiff_t i = m + 1; i < en; i += kTogether) {
             const std::ptrdiff_t rows = std::min(kTogether, en - i);
             const std::ptrdiff_t common = i + rows - 1;

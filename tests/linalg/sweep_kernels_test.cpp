@@ -14,7 +14,7 @@
 namespace krnumer {
 namespace {
 
-constexpr int32_t kRows = 9;
+constexpr int32_t kRows = 23;
 constexpr int32_t kWidths[] = {1, 2, 3, 4, 5, 7, 8, 9, 15, 16, 17, 31, 32, 33, 40, 63, 64, 65, 130};
 
 TEST(RotateChain, RotatesNeighboursOneAfterTheOther) {
