@@ -69,7 +69,7 @@ double Upward(const Orders& start, double n, double x) {
         const double next = 2.0 * k / x * value - before;
         before = value;
         value = next;
-        if (std::isinf(value)) break;
+        if (!std::isfinite(value)) break;
     }
     return value;
 }

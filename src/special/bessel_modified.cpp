@@ -10,6 +10,7 @@
 #include "special/domain.h"
 #include "special/gamma.h"
 #include "special/hypergeometric.h"
+#include "special/ln_half.h"
 #include "special/parity.h"
 #include "special/polynomial.h"
 
@@ -22,12 +23,12 @@ constexpr double kLnSmallest = -745.2;  // of the smallest double
 
 // For x > 0.
 double BesselK0(double x) {
-    if (x <= 2.0) return ChebyshevSum(x * x - 2.0, kK0A) - std::log(0.5 * x) * BesselI0(x);
+    if (x <= 2.0) return ChebyshevSum(x * x - 2.0, kK0A) - LnHalf(x) * BesselI0(x);
     return std::exp(-x) * ChebyshevSum(8.0 / x - 2.0, kK0B) / std::sqrt(x);
 }
 
 double BesselK1(double x) {
-    if (x <= 2.0) return std::log(0.5 * x) * BesselI1(x) + ChebyshevSum(x * x - 2.0, kK1A) / x;
+    if (x <= 2.0) return LnHalf(x) * BesselI1(x) + ChebyshevSum(x * x - 2.0, kK1A) / x;
     return std::exp(-x) * ChebyshevSum(8.0 / x - 2.0, kK1B) / std::sqrt(x);
 }
 
@@ -43,7 +44,7 @@ double MillerStart(double n, double x) {
 
 // I_n(x) for n > 1 and x > 0 by the downward recurrence, made true by I_0.
 double Miller(double n, double x) {
-    const double ln_leading = n * std::log(x / 2.0) - LnGamma(n + 1.0);
+    const double ln_leading = n * LnHalf(x) - LnGamma(n + 1.0);
     if (ln_leading + x * x / (4.0 * (n + 1.0)) < kLnSmallest) return 0.0;  // a bound of ln I_n
     const double i0 = BesselI0(x);
     if (std::isinf(i0)) return kInfinity;
@@ -113,7 +114,7 @@ double BesselI(double v, double x) {
     }
     const double a = v + 0.5;
     if (a <= 0.0 && IsWhole(a)) return ModifiedSeries(v, x);
-    const double scale = std::exp(v * std::log(x / 2.0) - x) / Gamma(v + 1.0);
+    const double scale = std::exp(v * LnHalf(x) - x) / Gamma(v + 1.0);
     return scale * KummerM(a, 2.0 * a, 2.0 * x);
 }
 
@@ -131,7 +132,7 @@ double BesselK(int32_t n, double x) {
         const double above = 2.0 * j / x * value + below;
         below = value;
         value = above;
-        if (std::isinf(value) || (value == 0.0 && below == 0.0)) break;
+        if (!std::isfinite(value) || (value == 0.0 && below == 0.0)) break;
     }
     return value;
 }

@@ -6,6 +6,7 @@
 
 #include "special/domain.h"
 #include "special/gamma.h"
+#include "special/ln_half.h"
 #include "special/parity.h"
 
 namespace krnumer {
@@ -45,7 +46,7 @@ double SumInGroups(double sum, Term&& term) {
 
 // (x / 2)^n / n! is below the smallest double.
 bool LeadingTermVanishes(double n, double x) {
-    return n * std::log(x / 2.0) - LnGamma(n + 1.0) < kLnSmallest;
+    return n * LnHalf(x) - LnGamma(n + 1.0) < kLnSmallest;
 }
 
 // The series of ber or bei, for n >= 0 and x >= 0, from its leading sign and the factors of the terms after the first.
@@ -131,7 +132,7 @@ KelvinParts KelvinK(int32_t n, double x) {
     }
     const KelvinParts first_kind = Ascending(order, x);
     if (std::isnan(first_kind.real) || std::isnan(first_kind.imaginary)) return {kQuietNaN, kQuietNaN};
-    const double ln_half = std::log(x / 2.0);
+    const double ln_half = LnHalf(x);
     KelvinParts sum{-ln_half * first_kind.real + kQuarterPi * first_kind.imaginary,
                     -ln_half * first_kind.imaginary - kQuarterPi * first_kind.real};
     if (order > 0.0) {

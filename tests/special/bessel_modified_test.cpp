@@ -131,6 +131,13 @@ TEST(BesselK, KnowsItsLimits) {
     EXPECT_EQ(K(2, 1e-310), kInfinity);
 }
 
+// Half of it is 0, whose logarithm is no number to go on with.
+TEST(BesselK, TakesTheLeastDouble) {
+    constexpr double kLeast = std::numeric_limits<double>::denorm_min();
+    EXPECT_THAT(K(0, kLeast), Near(744.5560034370397, 1e-15));
+    for (const int32_t n : {1, 2, -3, kIntMax, kIntMin}) EXPECT_EQ(K(n, kLeast), kInfinity) << n;
+}
+
 TEST(KelvinFirst, AgreesWithGoldenData) {
     // Terms cancel as e^(x (1 - 1 / sqrt 2)), and the series ends by an absolute measure where the sum is small.
     const std::vector<Bound> bounds = {
@@ -185,6 +192,12 @@ TEST(KelvinSecond, FollowsTheParityOfItsOrder) {
         EXPECT_EQ(Second(-n, 2.5).real, sign * Second(n, 2.5).real);
         EXPECT_EQ(Second(-n, 2.5).imaginary, sign * Second(n, 2.5).imaginary);
     }
+}
+
+TEST(KelvinSecond, TakesTheLeastDouble) {
+    const Kelvin least = Second(0, std::numeric_limits<double>::denorm_min());
+    EXPECT_THAT(least.real, Near(744.5560034370397, 1e-15));
+    EXPECT_THAT(least.imaginary, Near(-0.7853981633974483, 1e-15));
 }
 
 TEST(KelvinSecond, IsNaNOutsideItsDomain) {
