@@ -130,6 +130,7 @@ double BesselRatio(double n, double x) {
     double b = 2.0 * n, change;
     do {
         fraction.Append(-(x * x), b + 2.0);
+        fraction.KeepFromOverflow();
         fraction.Append(-(x * x), b += 4.0);
         change = fraction.Update();
         fraction.KeepFromOverflow();

@@ -4,6 +4,7 @@
 #include <limits>
 
 #include "krnumer/special.h"
+#include "special/bessel_integer.h"
 #include "special/golden.h"
 #include "special/values.h"
 #include "support/numbers.h"
@@ -74,6 +75,16 @@ TEST(BesselJ, FollowsTheParityOfIntegers) {
             EXPECT_EQ(J(-n, x), sign * J(n, x)) << n;
             EXPECT_EQ(J(n, -x), sign * J(n, x)) << n;
             EXPECT_EQ(J(-n, -x), J(n, x)) << n;
+        }
+    }
+}
+
+// 1 / r(n) + r(n + 1) = 2 n / x for r(n) = J_n / J_(n - 1).
+TEST(BesselRatio, ObeysTheRecurrenceUpToTheLargestOrders) {
+    for (const double n : {2.0, 16.5, 1000.0, 1e6, 1e9, 2147483646.0}) {
+        for (const double z : {1e-3, 0.5, 0.999, 1.0}) {
+            const double x = z * n;
+            EXPECT_THAT(1.0 / BesselRatio(n, x) + BesselRatio(n + 1.0, x), Near(2.0 * n / x, 1e-11)) << n << " " << z;
         }
     }
 }
