@@ -321,7 +321,8 @@ KRNUMER_API void KR_Kummer(double x, double a, double b, double* out);
  * 13.5.2): 1e-15 above 40, 2e-5 between 15 and 40 for a and b up to 2, worse for smaller x and larger a: 24 % at U(3,
  * 2, 6).
  *
- * +infinity at x = 0; NaN for x < 0 and for arguments that are not finite.
+ * +infinity at x = 0; NaN for x < 0, for arguments that are not finite, and where the asymptotic series still falls
+ * after 1e7 terms, as it may for a huge b near x.
  *
  * @param[in]  x    x > 0
  * @param[in]  a    first parameter

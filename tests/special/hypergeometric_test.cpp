@@ -190,6 +190,10 @@ TEST(Tricomi, IsOnlyAsymptoticFromSixOn) {
     EXPECT_LT(U(10.0, 1.0, 6.0), 0.0);  // true: 6.4e-12
 }
 
+TEST(Tricomi, GivesUpSeriesWithoutEnd) {
+    for (const double huge : {1e9, 1e16, 1e300}) EXPECT_THAT(U(0.5, huge, huge), QuietNaN()) << huge;
+}
+
 TEST(Tricomi, KnowsItsLimits) {
     EXPECT_EQ(U(1.0, 1.0, 0.0), kInfinity);
     EXPECT_THAT(U(1.0, 1.0, -1.0), QuietNaN());
