@@ -55,7 +55,8 @@ KRNUMER_API int32_t PolyRootsNtBst_head(KrHandle coef, KrHandle newtonGuesses, i
  * @param[in,out] coef   coefficients, 1-D complex double; on return one element less: the roots in the order in which
  *                       they were found, those at 0 first. Zeros in the place of the highest coefficients give fewer
  *                       roots, and zeros behind them. Emptied on failure
- * @param[in]     limit  how often the step towards a root may be turned in a row before the search is given up
+ * @param[in]     limit  how often the step towards a root may be turned in a row before the search is given up; 20 for
+ *                       simple roots, 50 where roots are multiple
  * @param[out]    err    status: 0; -20003 when `coef` is empty; -20063 for a coefficient that is not finite, and when
  *                       nothing but a constant is left; -20062 without convergence, also when a root is beyond the
  *                       range of doubles; -20001 without memory

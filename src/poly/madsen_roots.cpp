@@ -37,13 +37,14 @@ Complex SquareRoot(Complex z) {
     return {root.real(), root.imag()};
 }
 
-// A polynomial, coefficients from the constant up. The highest one is not 0.
+// A polynomial, coefficients from the constant up, with all sizes that matter near 1.
 struct Descent {
     const Complex* c;
     int32_t degree;
 
     struct Point {
         Complex z;
+        Complex value;  // p(z)
         double height;  // |p(z)|
     };
 
@@ -57,7 +58,10 @@ struct Descent {
         for (int32_t k = degree - 1; k >= 1; --k) slope = slope * z + c[k] * k;
         return slope;
     }
-    Point At(Complex z) const { return {z, Magnitude(Value(z))}; }
+    Point At(Complex z) const {
+        const Complex value = Value(z);
+        return {z, value, Modulus(value)};
+    }
 
     Complex FirstStep() const;
     Point Search(const Point& from, Complex step, bool* whole_step) const;
@@ -66,14 +70,13 @@ struct Descent {
 
 // Half the way to a circle in which no root lies, in the direction of Newton's step from 0.
 Complex Descent::FirstStep() const {
-    double radius = kInfinity;
-    for (int32_t k = 1; k <= degree; ++k) {
-        const double height = Magnitude(c[k]);
-        if (height != 0.0) radius = std::min(radius, std::pow(Magnitude(c[0]) / height, 1.0 / k));
-    }
+    const auto size = [this](int32_t k) { return std::log2(c[k].re * c[k].re + c[k].im * c[k].im); };
+    const double constant = size(0);
+    double log_radius = kInfinity;
+    for (int32_t k = 1; k <= degree; ++k) log_radius = std::min(log_radius, (constant - size(k)) / (2.0 * k));
     Complex direction = -c[0] / c[1];
     if (!IsFinite(direction) || Magnitude(direction) == 0.0) direction = {1.0, 0.0};
-    return radius * 0.5 * (direction / Magnitude(direction));
+    return std::exp2(log_radius) * 0.5 * (direction / Magnitude(direction));
 }
 
 // The best of the points along the step: its multiples while they lead down, else its fractions, the last one turned.
@@ -108,7 +111,7 @@ int32_t Descent::Find(int32_t limit, Complex* root) const {
     constexpr Complex kBack = {-0.4, -0.3};  // turns a step that leads nowhere, and halves it
     constexpr Complex kAside = {0.8, 0.6};   // turns a step that is too long
     constexpr int32_t kMostPasses = 2000;    // data that overflow may wander without end
-    Point point{{0.0, 0.0}, Magnitude(c[0])};
+    Point point{{0.0, 0.0}, c[0], Modulus(c[0])};
     const double noise = (degree - 1) * point.height * kNoise;
     Complex slope = c[1];
     Complex step = FirstStep();
@@ -143,7 +146,7 @@ int32_t Descent::Find(int32_t limit, Complex* root) const {
             searching = true;
             continue;
         }
-        step = -Value(point.z) / slope;
+        step = -point.value / slope;
         const double length = Magnitude(step);
         // Ostrowski's condition: Newton's method converges from here.
         searching = !(whole_step && Magnitude(slope - slope_before) * length < 0.5 * Magnitude(slope) * walked);

@@ -38,7 +38,7 @@ anew.
 ### With multiplicities, and without guesses
 
 `MultPolyRoots_head` and `CxMultPolyRoots_head` with both stages and the default tolerance; `CxPolyRoots_head` with at
-most 20 turns; NumPy's eigenvalues.
+most 50 turns, which multiple roots may need; NumPy's eigenvalues.
 """
 
 NOTES = """\
@@ -86,7 +86,7 @@ class Polynomials(host.Library):
         return self.values(distinct, complex), self.values(mult, np.int32)
 
     def single(self, c):
-        coef, limit, err = self.array(c, complex), ctypes.c_int32(20), ctypes.c_int32()
+        coef, limit, err = self.array(c, complex), ctypes.c_int32(50), ctypes.c_int32()
         self.exports.CxPolyRoots_head(coef, ctypes.byref(limit), ctypes.byref(err))
         assert err.value == 0, err.value
         return self.values(coef, complex)
