@@ -37,28 +37,58 @@ ptrdiff_t CyclicRow(int32_t i, int32_t first, int32_t rows) {
     return i < left ? i + first : i - left;
 }
 
+// Columns start .. start + width - 1 of an array of `columns` columns, and where they are kept one behind the other.
+struct ColumnBlock {
+    int32_t rows, columns, start, width;
+
+    size_t operator()(int32_t column, int32_t row) const { return Count(column) * Count(rows) + Count(row); }
+};
+
+// Reads the first `used` rows in the cyclic order that starts with row `first`.
+void GatherColumns(const ColumnBlock& block, const Complex* x, int32_t first, int32_t used, Scratch<Complex>& to) {
+    for (int32_t i = 0; i < used; ++i) {
+        const Complex* row = x + CyclicRow(i, first, block.rows) * block.columns + block.start;
+        for (int32_t c = 0; c < block.width; ++c) to[block(c, i)] = row[c];
+    }
+}
+
+template <class T>
+void ScatterColumns(const ColumnBlock& block, const Scratch<T>& from, int32_t first, T* y) {
+    for (int32_t i = 0; i < block.rows; ++i) {
+        T* row = y + CyclicRow(i, first, block.rows) * block.columns + block.start;
+        for (int32_t c = 0; c < block.width; ++c) row[c] = from[block(c, i)];
+    }
+}
+
+// Calls run(block) for all columns.
+template <class Run>
+int32_t ForEachBlock(int32_t rows, int32_t columns, Run run) {
+    for (int32_t start = 0; start < columns; start += kColumnsAtOnce) {
+        const ColumnBlock block{rows, columns, start, std::min(kColumnsAtOnce, columns - start)};
+        if (const int32_t status = run(block)) return status;
+    }
+    return kOk;
+}
+
+size_t BlockSize(int32_t rows, int32_t columns) {
+    return Count(rows) * Count(std::min(kColumnsAtOnce, columns));
+}
+
 // Transforms all columns of y in place.
 int32_t TransformColumns(const ColumnPass& pass, Complex* y) {
-    const size_t block = Count(pass.rows) * Count(std::min(kColumnsAtOnce, pass.columns));
-    Scratch<Complex> in(block, Scratch<Complex>::kZeroed), out(block);
+    const size_t size = BlockSize(pass.rows, pass.columns);
+    Scratch<Complex> in(size, Scratch<Complex>::kZeroed), out(size);
     if (!in || !out) return kOutOfMemory;
-    for (int32_t start = 0; start < pass.columns; start += kColumnsAtOnce) {
-        const int32_t width = std::min(kColumnsAtOnce, pass.columns - start);
-        for (int32_t i = 0; i < pass.used; ++i) {
-            const Complex* row = y + CyclicRow(i, pass.first_read, pass.rows) * pass.columns + start;
-            for (int32_t c = 0; c < width; ++c) in[Count(c) * Count(pass.rows) + Count(i)] = row[c];
-        }
-        for (int32_t c = 0; c < width; ++c) {
-            const size_t column = Count(c) * Count(pass.rows);
+    return ForEachBlock(pass.rows, pass.columns, [&](const ColumnBlock& block) {
+        GatherColumns(block, y, pass.first_read, pass.used, in);
+        for (int32_t c = 0; c < block.width; ++c) {
+            const size_t column = block(c, 0);
             if (const int32_t status = Transform(pass.transform, pass.table, &in[column], &out[column], pass.rows))
                 return status;
         }
-        for (int32_t i = 0; i < pass.rows; ++i) {
-            Complex* row = y + CyclicRow(i, pass.first_written, pass.rows) * pass.columns + start;
-            for (int32_t c = 0; c < width; ++c) row[c] = out[Count(c) * Count(pass.rows) + Count(i)];
-        }
-    }
-    return kOk;
+        ScatterColumns(block, out, pass.first_written, y);
+        return kOk;
+    });
 }
 
 // One row forward, shifted if asked for.
@@ -91,18 +121,24 @@ int32_t InvertRows(const Complex* x, int32_t rows, int32_t columns, int32_t shif
     return kOk;
 }
 
-// Columns of the spectrum of a real array back into samples.
+// Columns of the spectrum of a real array back into samples. One half of them says all.
 int32_t InvertHermitianColumns(const Complex* x, int32_t rows, int32_t columns, int32_t shift, double* y,
                                const qmfft_table* table) {
-    Scratch<double> half_complex(Count(rows)), samples(Count(rows));
-    if (!half_complex || !samples) return kOutOfMemory;
-    for (int32_t c = 0; c < columns; ++c) {
-        PackHalfComplex(x + c, rows, shift, half_complex.data(), columns);
-        if (const int32_t status = InverseRealFFT(table, half_complex.data(), samples.data(), 1, 1, rows))
-            return status;
-        for (int32_t i = 0; i < rows; ++i) y[ptrdiff_t{i} * columns + c] = samples[Count(i)];
-    }
-    return kOk;
+    const size_t size = BlockSize(rows, columns);
+    Scratch<Complex> spectra(size);
+    Scratch<double> half_complex(Count(rows)), samples(size);
+    if (!spectra || !half_complex || !samples) return kOutOfMemory;
+    return ForEachBlock(rows, columns, [&](const ColumnBlock& block) {
+        GatherColumns(block, x, shift != 0 ? rows / 2 : 0, rows / 2 + 1, spectra);
+        for (int32_t c = 0; c < block.width; ++c) {
+            const size_t column = block(c, 0);
+            PackHalfComplex(&spectra[column], rows, 0, half_complex.data());
+            if (const int32_t status = InverseRealFFT(table, half_complex.data(), &samples[column], 1, 1, rows))
+                return status;
+        }
+        ScatterColumns(block, samples, 0, y);
+        return kOk;
+    });
 }
 
 }  // namespace

@@ -1,7 +1,6 @@
 #include "fft/half_complex.h"
 
 #include <algorithm>
-#include <cstddef>
 
 namespace krnumer {
 
@@ -16,15 +15,14 @@ void ExpandHalfComplex(Complex* data, int32_t n, int32_t shift) {
     if (shift != 0) ShiftSpectrum(data, n);
 }
 
-void PackHalfComplex(const Complex* data, int32_t n, int32_t shift, double* out, int32_t stride) {
-    const ptrdiff_t step = stride;
-    const Complex* origin = shift != 0 ? data + n / 2 * step : data;
+void PackHalfComplex(const Complex* data, int32_t n, int32_t shift, double* out) {
+    const Complex* origin = shift != 0 ? data + n / 2 : data;
     out[0] = origin->re;
     for (int32_t k = 1; k <= (n - 1) / 2; ++k) {
-        out[k] = origin[k * step].re;
-        out[n - k] = origin[k * step].im;
+        out[k] = origin[k].re;
+        out[n - k] = origin[k].im;
     }
-    if (n % 2 == 0) out[n / 2] = data[shift != 0 ? 0 : n / 2 * step].re;
+    if (n % 2 == 0) out[n / 2] = data[shift != 0 ? 0 : n / 2].re;
 }
 
 void ShiftSpectrum(Complex* data, int32_t n) {

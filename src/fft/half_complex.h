@@ -17,9 +17,8 @@ inline double* HalfComplexPart(Complex* data, int32_t n) {
 // Half-complex values become the full spectrum, in place.
 void ExpandHalfComplex(Complex* data, int32_t n, int32_t shift);
 
-// The half-complex form of a spectrum whose values stand `stride` complex numbers apart. One half is read, and of X[0]
-// and of the Nyquist term the real part.
-void PackHalfComplex(const Complex* data, int32_t n, int32_t shift, double* out, int32_t stride = 1);
+// The half-complex form of a spectrum. One half is read, and of X[0] and of the Nyquist term the real part.
+void PackHalfComplex(const Complex* data, int32_t n, int32_t shift, double* out);
 
 // Shifts a spectrum in place.
 void ShiftSpectrum(Complex* data, int32_t n);

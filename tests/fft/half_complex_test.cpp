@@ -68,13 +68,6 @@ TEST(PackHalfComplex, ReadsOneHalf) {
     EXPECT_THAT(packed, testing::ElementsAre(7, 5, 3, 1));
 }
 
-TEST(PackHalfComplex, ReadsAColumn) {
-    const std::vector<Complex> rows{{7, 0}, {9, 9}, {5, 1}, {9, 9}, {3, 0}, {9, 9}, {9, 9}, {9, 9}};
-    std::vector<double> packed(4);
-    PackHalfComplex(rows.data(), 4, 0, packed.data(), 2);
-    EXPECT_THAT(packed, testing::ElementsAre(7, 5, 3, 1));
-}
-
 TEST(ShiftSpectrum, IsUndoneByCopyUnshifted) {
     for (int32_t n : {1, 2, 4, 5, 9}) {
         const std::vector<Complex> x = RandomComplex(n);
