@@ -9,6 +9,7 @@
 
 #include "fft/rader.h"
 #include "fft/vector_transform.h"
+#include "frame/memory.h"
 #include "frame/numeric.h"
 
 namespace krnumer {
@@ -82,7 +83,7 @@ void BindButterflies(qmfft_table* table) {
 template <class T>
 bool Allocate(T** pointer, size_t count) {
     if (count > PTRDIFF_MAX / sizeof(T)) return false;
-    *pointer = static_cast<T*>(std::malloc(count > 0 ? count * sizeof(T) : 1));
+    *pointer = static_cast<T*>(AllocateMemory(count * sizeof(T)));
     return *pointer != nullptr;
 }
 
