@@ -51,7 +51,8 @@ int32_t NextGoodLength(int32_t length);
 inline constexpr int32_t kLengthMismatch = -1;
 
 // The transforms; strides count doubles. They return 0, kLengthMismatch, or kOutOfMemory, which only lengths with prime
-// factors 23, 47 or above can give. Output must not overlap input. Any number of threads may use one table at once.
+// factors 23, 47 or above can give. Output must not overlap input. Any number of threads may use one table at once; long
+// transforms take up to 300 KiB of the stack.
 int32_t ComplexFFT(const qmfft_table* table, const double* in_re, const double* in_im, double* out_re, double* out_im,
                    int32_t in_stride, int32_t out_stride, int32_t n);
 int32_t InverseComplexFFT(const qmfft_table* table, const double* in_re, const double* in_im, double* out_re,

@@ -12,9 +12,6 @@
 namespace krnumer {
 namespace {
 
-// Data up to this size stay in the second-level cache between the stages.
-constexpr size_t kCachedBytes = 512 * 1024;
-
 // Larger data are worth their copies to tiles whatever the distance of their rows; smaller ones only if it is a
 // multiple of a page, so that all rows compete for the same few places in the caches.
 constexpr size_t kLargeBytes = 8 * 1024 * 1024;
@@ -205,11 +202,9 @@ void CombineColumnsBesideTiles(const qmfft_table* table, const Pass& pass, doubl
 
 template <class T>
 int32_t CountTiledFactors(const qmfft_table* table) {
-    const int32_t last = table->factorCount - 1;
-    if (last < 1 || Count(table->length) * sizeof(T) <= kCachedBytes || table->vectors[last] == nullptr) return 0;
     int32_t length = table->length;
     int32_t tiled = 0;
-    for (; tiled < last && length > kLongestSubsequence; length /= table->factors[tiled++])
+    for (; tiled < table->factorCount - 1 && length > kLongestSubsequence; length /= table->factors[tiled++])
         if (table->vectors[tiled] == nullptr) return 0;
     const bool rows_collide = Count(length) * sizeof(T) % kPage == 0;
     return rows_collide || Count(table->length) * sizeof(T) > kLargeBytes ? tiled : 0;

@@ -10,8 +10,8 @@
 
 namespace krnumer {
 
-// How many of the first factors have their stages run in tiles on elements T, Complex or double. The table's factors
-// and kernels must stand; 0 where the data stay in the cache anyway or a factor lacks vector kernels.
+// How many of the first factors should have their stages run in tiles on elements T, Complex or double, if the data do
+// not stay in the cache anyway. The table's factors and kernels must stand; 0 where one lacks vector kernels.
 template <class T>
 int32_t CountTiledFactors(const qmfft_table* table);
 

@@ -117,7 +117,7 @@ bool MakePlan(const qmfft_table* table, VectorPlan* plan) {
     const int32_t last = table->factorCount - 1;
     if (last < 0 || table->vectors[last] == nullptr) return true;
     const bool cached = Count(table->length) * sizeof(T) <= kCachedBytes;
-    const int32_t tiled = CountTiledFactors<T>(table);
+    const int32_t tiled = cached ? 0 : CountTiledFactors<T>(table);
     plan->tiled = tiled > 0;
     plan->length = table->length;
     plan->sequences = 1;
