@@ -11,7 +11,6 @@
 #include "frame/status.h"
 #include "krnumer/fft.h"
 #include "support/host_arrays.h"
-#include "sweep/allocator.h"
 
 namespace krnumer {
 namespace {
@@ -297,57 +296,6 @@ TEST_F(FftEntry, ReleasesTablesWithTheInstance) {
     }
     EXPECT_EQ(table->refCount, 1u);
     destroy_qmfft_table(table);
-}
-
-TEST_F(FftEntry, AllocatesNothingOnceItsSlotIsBound) {
-    const HostArray<Complex> x(RandomComplex(30));
-    const HostArray<double> r(RandomReal(30));
-    HostArray<Complex> out;
-    ASSERT_EQ(CxQMFFTH(x.handle(), out.handle(), &slot), kOk);
-    ASSERT_EQ(ReQMFFTH(r.handle(), out.handle(), &other), kOk);
-    const sweep::ArmedAllocator allocator(0);
-    ASSERT_EQ(CxQMFFTH(x.handle(), out.handle(), &slot), kOk);
-    ASSERT_EQ(ReQMFFTH(r.handle(), out.handle(), &other), kOk);
-    EXPECT_EQ(sweep::ArmedAllocator::allocations(), 0);
-}
-
-// A fresh slot stays null; a slot in use loses its table, and is bound again later with the one clean-up it has.
-TEST_F(FftEntry, SurvivesATableThatCannotBeMade) {
-    const HostArray<Complex> a(RandomComplex(16)), b(RandomComplex(20));
-    HostArray<Complex> out{{9, 8}};
-    for (int32_t nth : {1, 2, 3}) {
-        const sweep::ArmedAllocator allocator(nth);
-        ASSERT_EQ(CxQMFFTH(a.handle(), out.handle(), &slot), kOutOfMemory);
-        EXPECT_EQ(slot, nullptr);
-    }
-    EXPECT_EQ(instance.pending_cleanups(), 0);
-    EXPECT_THAT(out.values(), ElementsAre(Complex{9, 8}));
-
-    ASSERT_EQ(CxQMFFTH(a.handle(), out.handle(), &slot), kOk);
-    {
-        const sweep::ArmedAllocator allocator(1);
-        ASSERT_EQ(CxQMFFTH(b.handle(), out.handle(), &slot), kOutOfMemory);
-    }
-    ASSERT_NE(slot, nullptr);
-    EXPECT_EQ(TableOf(slot), nullptr);
-    ASSERT_EQ(CxQMFFTH(b.handle(), out.handle(), &slot), kOk);
-    EXPECT_EQ(instance.pending_cleanups(), 1);
-    {
-        const sweep::ArmedAllocator allocator(1);
-        ASSERT_EQ(CxQMFFTH(a.handle(), out.handle(), &slot), kOutOfMemory);
-    }
-}
-
-// Without memory for the padding the result has its size, no contents, and the status of success.
-TEST_F(FftEntry, SizesARealResultThatItCannotPad) {
-    const HostArray<double> x{1, 2, 3};
-    HostArray<Complex> out;
-    ASSERT_EQ(ReQMFFTH80(x.handle(), out.handle(), &slot, 0, 6, 0), kOk);
-    HostArray<Complex> other_out;
-    const sweep::ArmedAllocator allocator(1);
-    EXPECT_EQ(ReQMFFTH80(x.handle(), other_out.handle(), &slot, 0, 6, 0), kOk);
-    EXPECT_TRUE(sweep::ArmedAllocator::refused());
-    EXPECT_EQ(other_out.size(), 6);
 }
 
 TEST_F(FftEntry, HandsOutTables) {

@@ -10,7 +10,6 @@
 #include <vector>
 
 #include "frame/complex.h"
-#include "sweep/allocator.h"
 
 namespace krnumer {
 namespace {
@@ -159,33 +158,6 @@ TEST(FftTable, OrdersRaderSamplesByPowersOfTheLeastRoot) {
         EXPECT_EQ(stage.raderOut[k], power);
         EXPECT_EQ(stage.raderIn[k] * power % 53, 1);
         power = power * 2 % 53;
-    }
-}
-
-TEST(FftTable, IsNotMadeWhenAnyAllocationFails) {
-    // Twiddles, a direct factor, Rader factors of two levels.
-    for (int32_t length : {1, 7, 1000, 46, 47 * 53, 107 * 23}) {
-        int32_t failures = 0;
-        for (;; ++failures) {
-            qmfft_table* table;
-            bool refused;
-            {
-                const sweep::ArmedAllocator allocator(failures + 1);
-                table = CreateTable(length);
-                refused = sweep::ArmedAllocator::refused();
-            }
-            if (!refused) {
-                ASSERT_NE(table, nullptr);
-                DestroyTable(table);
-                break;
-            }
-            ASSERT_EQ(table, nullptr) << length << " at allocation " << failures + 1;
-            const HeldTable probe(6);
-            EXPECT_THAT(LengthsFrom(probe.get()), ElementsAre(6));
-            EXPECT_EQ(sweep::LiveAllocations(), 0);
-        }
-        EXPECT_GE(failures, length == 1 ? 1 : 2);
-        EXPECT_EQ(sweep::LiveAllocations(), 0);
     }
 }
 

@@ -12,7 +12,6 @@
 #include "frame/complex.h"
 #include "frame/status.h"
 #include "support/numbers.h"
-#include "sweep/allocator.h"
 
 namespace krnumer {
 namespace {
@@ -316,38 +315,6 @@ TEST(Fft, TurnsADelayIntoARotation) {
             const double angle = 6.283185307179586 * static_cast<double>(int64_t{k} * delay % n) / n;
             EXPECT_NEAR(y[static_cast<size_t>(k)].re, std::cos(angle), 3e-14) << n;
             EXPECT_NEAR(y[static_cast<size_t>(k)].im, -std::sin(angle), 3e-14) << n;
-        }
-    }
-}
-
-TEST(Fft, AllocatesNothingAtListedRadices) {
-    for (int32_t n : {16, 1000, 1024, 4096, 30030, 43 * 41}) {
-        const HeldTable table(n);
-        const std::vector<Complex> x = RandomComplex(n);
-        std::vector<Complex> y(x.size());
-        const sweep::ArmedAllocator allocator(0);
-        ASSERT_EQ(ComplexFFT(table.get(), &x[0].re, &x[0].im, &y[0].re, &y[0].im, 2, 2, n), kOk);
-        ASSERT_EQ(RealFFT(table.get(), &x[0].re, &y[0].re, 1, 1, n), kOk);
-        EXPECT_EQ(sweep::ArmedAllocator::allocations(), 0);
-    }
-}
-
-TEST(Fft, ReportsMissingMemory) {
-    for (int32_t n : {23, 46, 23 * 23, 53, 106, 53 * 53, 107}) {
-        const HeldTable table(n);
-        const std::vector<Complex> x = RandomComplex(n);
-        std::vector<Complex> y(x.size());
-        for (const bool real : {false, true}) {
-            int32_t refused = 0;
-            for (bool met = true; met;) {
-                const sweep::ArmedAllocator allocator(++refused);
-                const int32_t status = real ? RealFFT(table.get(), &x[0].re, &y[0].re, 1, 1, n)
-                                            : ComplexFFT(table.get(), &x[0].re, &x[0].im, &y[0].re, &y[0].im, 2, 2, n);
-                met = sweep::ArmedAllocator::refused();
-                ASSERT_EQ(status, met ? kOutOfMemory : kOk) << n;
-            }
-            EXPECT_GT(refused, 1) << n;
-            EXPECT_EQ(sweep::LiveAllocations(), 0);
         }
     }
 }
