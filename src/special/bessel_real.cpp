@@ -103,43 +103,42 @@ double ByRecurrence(double v, double x) {
     return down.ratio == 0.0 ? 0.0 : down.ratio * ByEitherSeries(down.from, x);
 }
 
+// For x >= 0.
+double JOfRealOrder(double v, double x) {
+    if (x < kEpsilon) return DomainError(0.0);
+    const double size = std::abs(v), reach = 3.6 * std::sqrt(x);
+    if (size > 17.0) {
+        if (x < 3.6 * std::sqrt(size)) return JvSeries(v, x);
+        if (size < reach) return JvHankel(v, x);
+    }
+    if (size < kUniformFrom) return ByRecurrence(v, x);
+    return x / v / v > 0.3 ? JvHankel(v, x) : BesselJUniform(v, x);
+}
+
 }  // namespace
 
 double BesselJ(double v, double x) {
     if (!std::isfinite(x) || !std::isfinite(v)) return kQuietNaN;
-    const double size = std::abs(v);
-    const bool is_integer = IsWhole(v);
-    if (v < kLeastOrder && !is_integer) return DomainError(kQuietNaN);
-    double sign = 1.0;
-    if (is_integer) {
-        if (IsOdd(size) && (v < 0.0) != (x < 0.0)) sign = -1.0;
-        v = size;
-        x = std::abs(x);
-        if (size <= kLargestInteger) return sign * BesselJn(v, x);
+    if (IsWhole(v)) {
+        const double order = std::abs(v), size = std::abs(x);
+        const double j = order <= kLargestInteger ? BesselJn(order, size) : JOfRealOrder(order, size);
+        return (v < 0.0) != (x < 0.0) && IsOdd(v) ? -j : j;
     }
-    if (x < 0.0) return DomainError(kQuietNaN);
-    if (x < kEpsilon) return DomainError(0.0);
-    const double reach = 3.6 * std::sqrt(x);
-    if (size > 17.0) {
-        if (x < 3.6 * std::sqrt(size)) return sign * JvSeries(v, x);
-        if (size < reach) return sign * JvHankel(v, x);
-    }
-    if (size < kUniformFrom) return sign * ByRecurrence(v, x);
-    return sign * (x / v / v > 0.3 ? JvHankel(v, x) : BesselJUniform(v, x));
+    if (v < kLeastOrder || x < 0.0) return DomainError(kQuietNaN);
+    return JOfRealOrder(v, x);
 }
 
 double BesselY(double v, double x) {
     if (!std::isfinite(x)) return kQuietNaN;
     if (x <= 0.0) return DomainError(kQuietNaN);
     if (!(std::abs(v) <= kLargestInteger + 1.0)) return DomainError(kQuietNaN);
-    if (std::abs(v - std::floor(v)) < 1e-8) {
-        if (IsWhole(v)) {
-            if (v > kLargestInteger) return DomainError(kQuietNaN);
-            return v < 0.0 && IsOdd(v) ? -BesselYn(-v, x) : BesselYn(std::abs(v), x);
-        }
-        DomainError(v);  // digits are lost below
+    if (IsWhole(v)) {
+        if (v > kLargestInteger) return DomainError(kQuietNaN);
+        const double y = BesselYn(std::abs(v), x);
+        return v < 0.0 && IsOdd(v) ? -y : y;
     }
     if (v < kLeastOrder) return DomainError(kQuietNaN);
+    if (v - std::floor(v) < 1e-8) DomainError(v);  // digits are lost below
     const double j = BesselJ(v, x), reflected = BesselJ(-v, x);
     if (!std::isfinite(j) || !std::isfinite(reflected)) return kQuietNaN;
     return (std::cos(kPi * v) * j - reflected) / std::sin(kPi * v);
