@@ -30,18 +30,36 @@ double RowWeight(T right) {
     return size >= 1.0 ? 1.0 / size : 1.0;
 }
 
+// Eigenvalues of the companion matrix. On roots in symmetrical places the iteration may go in circles; the same matrix
+// in another order of its rows and columns, or transposed, then takes other steps.
 template <class T>
 int32_t CompanionRoots(const T* f, int32_t degree, Complex* roots) {
+    struct Order {
+        bool backward, transposed;
+    };
     const std::size_t n = Count(degree);
-    Scratch<T> companion(n * n, Scratch<T>::kZeroed);
+    Scratch<T> companion(n * n);
     if (!companion) return kOutOfMemory;
-    for (std::size_t i = 0; i < n; ++i) companion[i] = -f[i + 1];
-    for (std::size_t i = 1; i < n; ++i) companion[i * n + i - 1] = FromReal<T>(1.0);
-    if constexpr (kIsComplex<T>) {
-        return CxEigenGeneralCore(companion.data(), degree, 0, roots, nullptr);
-    } else {
-        return EigenGeneralCore(companion.data(), degree, 0, roots, nullptr);
+    for (const Order order : {Order{false, false}, Order{true, false}, Order{false, true}, Order{true, true}}) {
+        const auto at = [&](std::size_t i, std::size_t j) -> T& {
+            if (order.backward) {
+                i = n - 1 - i;
+                j = n - 1 - j;
+            }
+            return companion[order.transposed ? j * n + i : i * n + j];
+        };
+        std::fill_n(companion.data(), n * n, T{});
+        for (std::size_t i = 0; i < n; ++i) at(0, i) = -f[i + 1];
+        for (std::size_t i = 1; i < n; ++i) at(i, i - 1) = FromReal<T>(1.0);
+        int32_t status;
+        if constexpr (kIsComplex<T>) {
+            status = CxEigenGeneralCore(companion.data(), degree, 0, roots, nullptr);
+        } else {
+            status = EigenGeneralCore(companion.data(), degree, 0, roots, nullptr);
+        }
+        if (status != kNoConvergence) return status;
     }
+    return kNoConvergence;
 }
 
 namespace {

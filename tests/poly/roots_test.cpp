@@ -239,6 +239,16 @@ TEST_F(MultipleRoots, MayBeComplex) {
     ExpectRefined(roots, {2, 1, 4}, 1e-11);
 }
 
+TEST_F(MultipleRoots, MayLieSymmetrically) {
+    // The first divisor is exact to the last bit, and the eigenvalues of what is left lie on two circles.
+    for (const double root : {0.5, 1.5, 2.0, 2.5}) {
+        ASSERT_EQ(Find(RealProduct(Repeated({{root, 0}, {-root, 0}}, {6, 6}))), 0) << root;
+        EXPECT_THAT(mult_, ElementsAre(6, 6));
+        for (const Complex expected : {Complex{root, 0}, Complex{-root, 0}})
+            EXPECT_LT(Distance(expected, distinct_), 1e-14);
+    }
+}
+
 TEST_F(MultipleRoots, AreScaledToTheirSize) {
     const ComplexValues roots{{3e6, 0}, {1e6, 0}};
     ASSERT_EQ(Find(RealProduct(Repeated(roots, {2, 3}))), 0);
