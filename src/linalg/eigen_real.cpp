@@ -102,15 +102,14 @@ int32_t EigenGeneralCore(const double* a, int32_t order, int32_t want_vectors, C
     if (HasUnusable(a, Count(order) * Count(order))) return kNotFinite;
 
     const std::ptrdiff_t n = order;
-    Scratch<double> h(Count(order) * (Count(order) + 3));
+    Scratch<double> h(Count(order) * (Count(order) + 2));
     Scratch<int32_t> exchanged(Count(order));
     if (!h || !exchanged) return kOutOfMemory;
     double* scale = h.data() + n * n;
-    double* work = scale + n;  // 2 n
 
     std::copy_n(a, n * n, h.data());
     const Balance balance = BalanceMatrix(h.data(), n, scale);
-    Eliminate(h.data(), n, balance, exchanged.data(), work);
+    Eliminate(h.data(), n, balance, exchanged.data(), scale + n);
     double* columns = nullptr;
     if (want_vectors == 1) {
         columns = reinterpret_cast<double*>(v);  // the first half of v, until the vectors themselves are there
