@@ -11,6 +11,7 @@
 #include "frame/status.h"
 #include "krnumer/linalg_schur.h"
 #include "linalg/matrices.h"
+#include "reference/linalg/pencil.inc"
 
 namespace krnumer {
 namespace {
@@ -156,6 +157,31 @@ TYPED_TEST(Pencils, SortTheirEigenvalues) {
             for (int32_t i = 2; i < n; ++i)
                 for (int32_t j = 0; j + 1 < i; ++j) EXPECT_LE(Modulus(s(i, j)), 1e-12);
         }
+    }
+}
+
+TYPED_TEST(Pencils, HaveTheEigenvaluesOfSciPy) {
+    const auto& golden = GoldenPencil<TypeParam>::Values();
+    // Descending orders are compared backwards, real pairs aside: their first always has the positive imaginary part.
+    const auto expect = [&](int32_t order, const std::vector<Complex>& ascending) {
+        ASSERT_EQ(this->Decompose(golden.a, golden.b, 1, order), 0);
+        const auto beta = AsComplex(this->beta_.values());
+        for (std::size_t i = 0; i < ascending.size(); ++i) {
+            const Complex value = this->w_.values()[i] / beta[i];
+            Complex expected = ascending[order % 2 == 1 ? i : ascending.size() - 1 - i];
+            if (order % 2 == 0 && !kIsComplex<TypeParam>) expected.im = -expected.im;
+            EXPECT_LE(Modulus(value - expected), 1e-12 * std::max(1.0, Modulus(expected))) << order << " at " << i;
+        }
+    };
+    expect(1, golden.by_real_part);
+    expect(2, golden.by_real_part);
+    expect(3, golden.by_modulus);
+    expect(4, golden.by_modulus);
+    ASSERT_EQ(this->Eigenvalues(golden.a, golden.b, 0), 0);
+    for (const Complex& expected : golden.by_modulus) {
+        double nearest = kInfinity;
+        for (const Complex& value : this->w_.values()) nearest = std::min(nearest, Modulus(value - expected));
+        EXPECT_LE(nearest, 1e-12 * std::max(1.0, Modulus(expected)));
     }
 }
 
