@@ -4,6 +4,7 @@
 
 #include "fft/factor.h"
 #include "fft/fft.h"
+#include "fft/inline.h"
 #include "fft/table.h"
 #include "fft/vector_transform.h"
 #include "frame/complex.h"
@@ -53,16 +54,39 @@ int32_t ComplexFFTStep(int32_t n, const qmfft_table* table, int32_t i, const dou
     return RunComplexStage(table, i, out_re, out_im, out_stride, m);
 }
 
-// Turns half-complex form into Hartley form, up to the order of the halves.
-void FoldHalves(double* data, int32_t stride, int32_t n) {
-    for (int32_t k = 1; k < (n + 1) / 2; ++k) {
-        double& lower = data[ptrdiff_t{k} * stride];
-        double& upper = data[ptrdiff_t{n - k} * stride];
-        const double a = lower;
-        const double b = upper;
-        lower = a - b;
-        upper = a + b;
+// Scales, and turns half-complex form into Hartley form, up to the order of the halves, or back. The halves do not
+// overlap, which the compiler has to be told.
+KRNUMER_FFT_INLINE void FoldHalvesAt(double* data, ptrdiff_t stride, int32_t n, double scale) {
+    double* KRNUMER_FFT_RESTRICT lower = data + stride;
+    double* KRNUMER_FFT_RESTRICT upper = data + (n - 1) * stride;
+    for (ptrdiff_t k = 0; k < (n - 1) / 2; ++k) {
+        const double a = lower[k * stride] * scale;
+        const double b = upper[-k * stride] * scale;
+        lower[k * stride] = a - b;
+        upper[-k * stride] = a + b;
     }
+    data[0] *= scale;
+    if (n % 2 == 0) data[n / 2 * stride] *= scale;
+}
+
+void FoldHalves(double* data, int32_t stride, int32_t n, double scale) {
+    if (stride == 1) {
+        FoldHalvesAt(data, 1, n, scale);
+    } else {
+        FoldHalvesAt(data, stride, n, scale);
+    }
+}
+
+// Exchanges every value k with value n - k; store(k, x) scales.
+template <class Value, class Store>
+void ReverseAndScale(int32_t n, const Value& value, const Store& store) {
+    for (int32_t k = 1; k <= (n - 1) / 2; ++k) {
+        const Complex lower = value(k);
+        store(k, value(n - k));
+        store(n - k, lower);
+    }
+    store(0, value(0));
+    if (n % 2 == 0) store(n / 2, value(n / 2));
 }
 
 }  // namespace
@@ -100,6 +124,12 @@ int32_t InverseComplexFFT(const qmfft_table* table, const double* in_re, const d
                           double* out_im, int32_t in_stride, int32_t out_stride, int32_t n) {
     if (const int32_t status = ComplexFFT(table, in_re, in_im, out_re, out_im, in_stride, out_stride, n)) return status;
     const double scale = 1.0 / n;
+    if (out_im == out_re + 1 && out_stride == 2) {
+        auto* out = reinterpret_cast<Complex*>(out_re);
+        ReverseAndScale(
+            n, [=](int32_t k) { return out[k]; }, [=](int32_t k, Complex x) { out[k] = x * scale; });
+        return kOk;
+    }
     const auto value = [&](int32_t k) {
         const ptrdiff_t at = ptrdiff_t{k} * out_stride;
         return Complex{out_re[at], out_im[at]};
@@ -109,13 +139,7 @@ int32_t InverseComplexFFT(const qmfft_table* table, const double* in_re, const d
         out_re[at] = x.re * scale;
         out_im[at] = x.im * scale;
     };
-    for (int32_t k = 1; k <= (n - 1) / 2; ++k) {
-        const Complex lower = value(k);
-        store(k, value(n - k));
-        store(n - k, lower);
-    }
-    store(0, value(0));
-    if (n % 2 == 0) store(n / 2, value(n / 2));
+    ReverseAndScale(n, value, store);
     return kOk;
 }
 
@@ -124,11 +148,9 @@ int32_t InverseComplexFFT(const qmfft_table* table, const double* in_re, const d
 int32_t InverseRealFFT(const qmfft_table* table, double* in, double* out, int32_t in_stride, int32_t out_stride,
                        int32_t n) {
     if (n != table->length) return kLengthMismatch;
-    const double scale = 1.0 / n;
-    for (int32_t k = 0; k < n; ++k) in[ptrdiff_t{k} * in_stride] *= scale;
-    FoldHalves(in, in_stride, n);
+    FoldHalves(in, in_stride, n, 1.0 / n);
     if (const int32_t status = RealFFT(table, in, out, in_stride, out_stride, n)) return status;
-    FoldHalves(out, out_stride, n);
+    FoldHalves(out, out_stride, n, 1.0);
     return kOk;
 }
 
