@@ -31,8 +31,9 @@ namespace krnumer {
 namespace {
 
 // Powers of two, other products of small primes, and primes.
-constexpr int32_t kLengths[] = {16,   64,    256,    1024,    4096, 16384, 65536, 1048576, 100, 360,
-                                1000, 10000, 100000, 1000000, 2187, 30030, 17,    101,     997, 10007};
+constexpr int32_t kLengths[] = {16,     64,      128,     256,  512,   1024, 2048, 4096, 8192, 16384,
+                                65536,  262144,  1048576, 100,  120,   360,  500,  1000, 5000, 10000,
+                                100000, 1000000, 2187,    3125, 30030, 17,   43,   101,  997,  10007};
 
 enum Kind { kComplexKind, kRealKind };
 constexpr const char* kKindNames[] = {"complex transform", "real transform"};
