@@ -24,46 +24,73 @@ int32_t LeastPrimitiveRoot(int32_t r) {
     return 1;
 }
 
+// Complex values at a stride in doubles: with real and imaginary parts side by side, or in arrays of their own.
+struct Interleaved {
+    double* re;
+    double* im;
+    ptrdiff_t stride;
+
+    Complex* At(ptrdiff_t k) const { return reinterpret_cast<Complex*>(re + k * stride); }
+    Complex Get(ptrdiff_t k) const { return *At(k); }
+    void Put(ptrdiff_t k, Complex value) const { *At(k) = value; }
+};
+
+struct Split {
+    double* re;
+    double* im;
+    ptrdiff_t stride;
+
+    Complex Get(ptrdiff_t k) const { return {re[k * stride], im[k * stride]}; }
+    void Put(ptrdiff_t k, Complex value) const {
+        re[k * stride] = value.re;
+        im[k * stride] = value.im;
+    }
+};
+
 // The transform of the convolution of `count` = r - 1 values, conjugated: z becomes the conjugate of z times the
 // kernel's spectrum, so that one more forward transform gives the conjugate of the inverse one.
-void MultiplyByKernel(const stage_tables& tables, double* re, double* im, ptrdiff_t stride, int32_t count) {
-    for (int32_t k = 0; k < count; ++k, re += stride, im += stride) {
-        const double z_re = *re;
-        const double z_im = *im;
-        *re = z_re * tables.raderRe[k] - z_im * tables.raderIm[k];
-        *im = -z_re * tables.raderIm[k] - z_im * tables.raderRe[k];
+template <class Values>
+void MultiplyByKernel(const stage_tables& tables, const Values& values, int32_t count) {
+    for (int32_t k = 0; k < count; ++k) {
+        const Complex z = values.Get(k);
+        const Complex w{tables.raderRe[k], tables.raderIm[k]};
+        values.Put(k, {z.re * w.re - z.im * w.im, -z.re * w.im - z.im * w.re});
     }
 }
 
-// r complex samples; in place is allowed. `work` holds r - 1 values.
-int32_t RaderComplex(int32_t r, const double* in_re, const double* in_im, double* out_re, double* out_im,
-                     const stage_tables& tables, ptrdiff_t in_stride, int32_t out_stride, Complex* work) {
-    const Complex first{in_re[0], in_im[0]};
+// r complex samples in(k); `out` may be where they are. `work` holds r - 1 values.
+template <class In, class Out>
+int32_t TransformByRader(int32_t r, const In& in, const Out& out, const stage_tables& tables, Complex* work) {
+    const auto stride = static_cast<int32_t>(out.stride);
+    const Out rest{out.re + stride, out.im + stride, stride};
+    const Complex first = in(0);
     Complex total = first;
     for (int32_t k = 1; k < r; ++k) {
-        const ptrdiff_t at = tables.raderIn[k] * in_stride;
-        work[k - 1] = {in_re[at], in_im[at]};
+        work[k - 1] = in(tables.raderIn[k]);
         total += work[k - 1];
     }
-    out_re[0] = total.re;
-    out_im[0] = total.im;
-    double* rest_re = out_re + out_stride;
-    double* rest_im = out_im + out_stride;
+    out.Put(0, total);
     if (const int32_t status =
-            ComplexFFT(tables.raderTable, &work->re, &work->im, rest_re, rest_im, 2, out_stride, r - 1)) {
+            ComplexFFT(tables.raderTable, &work->re, &work->im, rest.re, rest.im, 2, stride, r - 1)) {
         return status;
     }
-    MultiplyByKernel(tables, rest_re, rest_im, out_stride, r - 1);
+    MultiplyByKernel(tables, rest, r - 1);
     if (const int32_t status =
-            ComplexFFT(tables.raderTable, rest_re, rest_im, &work->re, &work->im, out_stride, 2, r - 1)) {
+            ComplexFFT(tables.raderTable, rest.re, rest.im, &work->re, &work->im, stride, 2, r - 1)) {
         return status;
     }
-    for (int32_t k = 1; k < r; ++k) {
-        const ptrdiff_t at = tables.raderOut[k] * ptrdiff_t{out_stride};
-        out_re[at] = first.re + work[k - 1].re;
-        out_im[at] = first.im - work[k - 1].im;
-    }
+    for (int32_t k = 1; k < r; ++k) out.Put(tables.raderOut[k], {first.re + work[k - 1].re, first.im - work[k - 1].im});
     return kOk;
+}
+
+int32_t RaderComplex(int32_t r, const double* in_re, const double* in_im, double* out_re, double* out_im,
+                     const stage_tables& tables, ptrdiff_t in_stride, int32_t out_stride, Complex* work) {
+    if (in_im == in_re + 1 && out_im == out_re + 1) {
+        const auto in = [=](ptrdiff_t k) { return *reinterpret_cast<const Complex*>(in_re + k * in_stride); };
+        return TransformByRader(r, in, Interleaved{out_re, out_im, out_stride}, tables, work);
+    }
+    const auto in = [=](ptrdiff_t k) { return Complex{in_re[k * in_stride], in_im[k * in_stride]}; };
+    return TransformByRader(r, in, Split{out_re, out_im, out_stride}, tables, work);
 }
 
 // r real samples to half-complex form; in place is allowed. `work` and `spectrum` hold r - 1 values each.
@@ -80,7 +107,7 @@ int32_t RaderReal(int32_t r, const double* in, double* out, const stage_tables& 
     double* half_complex = HalfComplexPart(spectrum, r - 1);
     if (const int32_t status = RealFFT(tables.raderTable, samples, half_complex, 1, 1, r - 1)) return status;
     ExpandHalfComplex(spectrum, r - 1, 0);
-    MultiplyByKernel(tables, &spectrum->re, &spectrum->im, 2, r - 1);
+    MultiplyByKernel(tables, Interleaved{&spectrum->re, &spectrum->im, 2}, r - 1);
     if (const int32_t status =
             ComplexFFT(tables.raderTable, &spectrum->re, &spectrum->im, &work->re, &work->im, 2, 2, r - 1)) {
         return status;
