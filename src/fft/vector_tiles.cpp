@@ -12,8 +12,8 @@
 namespace krnumer {
 namespace {
 
-// Larger data are worth their copies to tiles whatever the distance of their rows; smaller ones only if it is a
-// multiple of a page, so that all rows compete for the same few places in the caches.
+// Larger data are worth copying to tiles whatever the distance of their rows; smaller data only if it is a multiple of a
+// page, so that all rows compete for the same few places in the caches.
 constexpr size_t kLargeBytes = 8 * 1024 * 1024;
 constexpr size_t kPage = 4096;
 
