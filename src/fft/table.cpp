@@ -90,9 +90,7 @@ bool Allocate(T** pointer, size_t count) {
 bool BuildTwiddles(stage_tables* stage, int32_t radix, int32_t m) {
     const size_t count = Count(m - 1) * Count(radix - 1);
     if (!Allocate(&stage->twiddleRe, count) || !Allocate(&stage->twiddleIm, count)) return false;
-    const double delta = kTwoPi / (static_cast<double>(radix) * m);
-    for (int32_t j = 1; j < radix; ++j)
-        FillRotations(j * delta, stage->twiddleRe + (j - 1), stage->twiddleIm + (j - 1), m - 1, radix - 1);
+    FillRotations(kTwoPi / (static_cast<double>(radix) * m), stage->twiddleRe, stage->twiddleIm, m - 1, radix - 1);
     return true;
 }
 
@@ -187,21 +185,45 @@ void UnlinkTable(qmfft_table* table) {
     if (table->next != nullptr) table->next->prev = table->prev;
 }
 
+// Columns `first` to before first + N of FillRotations. Each value of a column waits for the one above; columns side by
+// side wait together.
+template <int N>
+void FillColumns(double delta, int32_t first, double* re, double* im, int32_t rows, int32_t columns) {
+    double t[N], c[N], x[N], y[N];
+    for (int j = 0; j < N; ++j) {
+        const double theta = (first + j + 1) * delta;
+        const double half_sine = std::sin(theta / 2);
+        t[j] = -std::sin(theta);
+        c[j] = 2 * half_sine * half_sine;
+        x[j] = 1 - c[j];
+        y[j] = t[j];
+    }
+    re += first;
+    im += first;
+    for (int32_t k = 0; k < rows; ++k, re += columns, im += columns) {
+        for (int j = 0; j < N; ++j) {
+            re[j] = x[j];
+            im[j] = y[j];
+        }
+        for (int j = 0; j < N; ++j) {
+            const double next = x[j] - (t[j] * y[j] + c[j] * x[j]);
+            y[j] -= c[j] * y[j] - t[j] * x[j];
+            x[j] = next;
+        }
+    }
+}
+
 }  // namespace
 
-void FillRotations(double theta, double* re, double* im, int32_t count, int32_t step) {
-    const double half_sine = std::sin(theta / 2);
-    const double t = -std::sin(theta);
-    const double c = 2 * half_sine * half_sine;
-    double x = 1 - c;
-    double y = t;
-    for (int32_t k = 0; k < count; ++k, re += step, im += step) {
-        *re = x;
-        *im = y;
-        const double next = x - (t * y + c * x);
-        y -= c * y - t * x;
-        x = next;
-    }
+void FillRotations(double delta, double* re, double* im, int32_t rows, int32_t columns) {
+    int32_t first = 0;
+    const auto fill = [&]<int N>(std::integral_constant<int, N>) {
+        for (; columns - first >= N; first += N) FillColumns<N>(delta, first, re, im, rows, columns);
+    };
+    fill(std::integral_constant<int, 8>());
+    fill(std::integral_constant<int, 4>());
+    fill(std::integral_constant<int, 2>());
+    fill(std::integral_constant<int, 1>());
 }
 
 // Linking comes last, so that nobody finds a table that is still being built.

@@ -112,9 +112,9 @@ bool RunsInTiles(const qmfft_table* table, int32_t i) {
 qmfft_table* BuildTable(int32_t length);
 void ReleaseTable(qmfft_table* table);
 
-// Writes exp(-i k theta), k = 1 .. count, at a distance of step doubles by the recurrence of the twiddles:
-// one sine each for theta and its half, then two products and two sums a value.
+// Writes exp(-i j k delta), rows k = 1 .. `rows` of columns j = 1 .. `columns`, by the recurrence of the twiddles: one
+// sine each for the angle of a column and its half, then two products and two sums a value.
 // Source: R. C. Singleton, IEEE Trans. Audio Electroacoust. 17, 1969.
-void FillRotations(double theta, double* re, double* im, int32_t count, int32_t step);
+void FillRotations(double delta, double* re, double* im, int32_t rows, int32_t columns);
 
 }  // namespace krnumer
