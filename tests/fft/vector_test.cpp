@@ -96,7 +96,7 @@ TEST_P(VectorFft, GivesTheBitsOfThePlainButterfliesAtLargeLengths) {
 // even and odd numbers of rows and columns.
 TEST_P(VectorFft, GivesTheBitsOfThePlainButterfliesInTiles) {
     const InstructionSet set(GetParam());
-    for (int32_t n : {65536, 131072, 262144, 531441, 1000000, 1594323, 2097152}) ExpectSameBits(n);
+    for (int32_t n : {131072, 531441, 1000000, 1048576, 1594323}) ExpectSameBits(n);
 }
 
 // Infinities and zeros with a sign go through row 0 as they are.
