@@ -100,13 +100,22 @@ double ErrorBound(int32_t n) {
     return bound;
 }
 
+// The spectrum of the real parts of what has this spectrum.
+std::vector<LongComplex> HermitianPart(const std::vector<LongComplex>& y) {
+    std::vector<LongComplex> part;
+    for (size_t k = 0; k < y.size(); ++k) part.push_back((y[k] + std::conj(y[(y.size() - k) % y.size()])) / 2.0L);
+    return part;
+}
+
 void ExpectAgreesWithDefinition(int32_t n) {
     const double bound = ErrorBound(n);
     const std::vector<Complex> x = RandomComplex(n);
-    EXPECT_LT(RelativeError(Transform(x), ReferenceOf(x)), bound) << "complex, n = " << n;
-    const std::vector<double> r = RandomReal(n);
+    const std::vector<LongComplex> exact = ReferenceOf(x);
+    EXPECT_LT(RelativeError(Transform(x), exact), bound) << "complex, n = " << n;
+    std::vector<double> r;
+    for (Complex z : x) r.push_back(z.re);
     const std::vector<double> half_complex = Transform(r);
-    EXPECT_LT(RelativeError(Expanded(half_complex), ReferenceOf(r)), bound) << "real, n = " << n;
+    EXPECT_LT(RelativeError(Expanded(half_complex), HermitianPart(exact)), bound) << "real, n = " << n;
 
     EXPECT_LT(RelativeError(Transform(Transform(x), true), x), 2 * bound) << "complex and back, n = " << n;
     const std::vector<double> back = InverseTransform(half_complex);
@@ -140,7 +149,7 @@ TEST(Fft, AgreesWithTheDefinitionAtLargeLengths) {
 
 // Few samples that are not zero make every value of the spectrum a short sum.
 TEST(Fft, AgreesWithTheDefinitionOfSparseSamplesAtTheLargestLengths) {
-    for (int32_t n : {2000000, 2097143, 4194304}) {
+    for (int32_t n : {2000000, 4194304}) {
         std::mt19937 random(static_cast<uint32_t>(n));
         std::vector<int32_t> places(20);
         std::vector<Complex> x(static_cast<size_t>(n));
