@@ -262,7 +262,7 @@ typedef struct KrVariableResampleSpec {
 typedef struct KrResampleState {
     KrHandle history;     /**< 1-D, as the samples: those kept */
     int32_t historyCount; /**< how many of them there are */
-    KrHandle taps;        /**< 1-D double: work area */
+    KrHandle taps;        /**< 1-D double: weights of the samples around the next output */
     double gain;          /**< factor of the outputs */
     int32_t left;         /**< samples under the kernel up to the position of an output */
     int32_t right;        /**< and behind it */

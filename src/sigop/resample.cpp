@@ -144,6 +144,8 @@ int32_t ResampleRun(const T* x, int32_t n, const ResampleKernel& kernel, Resampl
         if (const int32_t status = PlaceKernel(kernel, stretch, next.frac, stream)) return status;
         built = false;
     }
+    // Callers see the taps of the next output in the stream.
+    if (!built) BuildResampleTaps(kernel, stretch, stream);
     return ResampleKeepHistory(x, n, stream);
 }
 

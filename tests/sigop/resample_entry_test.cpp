@@ -95,6 +95,28 @@ TYPED_TEST(ResampleConstExports, InitialiseTheState) {
     EXPECT_EQ(+this->state_.ratio, 2.0);
     EXPECT_EQ(+this->state_.frac, 0.75);
     EXPECT_EQ(+this->state_.index, 1);
+    EXPECT_THAT(this->taps_.values(), ElementsAre(0, 0.25, 0.5, 0.25, 0, 0));
+}
+
+TYPED_TEST(ResampleConstExports, LeaveTheTapsOfTheNextOutput) {
+    using T = TypeParam;
+    this->spec_ = {0.75, 0, 0.0, nullptr, 2};
+    ASSERT_EQ(this->Run(HostArray<T>(50), 1), 0);
+    ASSERT_GT(this->outputs_, 50);
+    for (const int32_t block : {0, 1, 2, 3}) {
+        ASSERT_EQ(this->Run(HostArray<T>(block), 0), 0);
+        const double frac = this->state_.frac;
+        const int32_t left = this->state_.left;
+        const int32_t right = this->state_.right;
+        const auto taps = this->taps_.values();
+        const auto kernel = this->kernel_.values();
+        for (int32_t t = 0; t < left + right; ++t) {
+            const double position = 2.0 - 2.0 * frac - 2.0 * (left - 1) + 2.0 * t;
+            const double next = position < 4.0 ? kernel[Count(static_cast<int32_t>(position)) + 1] : 0.0;
+            const double value = kernel[Count(static_cast<int32_t>(position))];
+            EXPECT_EQ(taps[Count(t)], value + (next - value) * (position - std::floor(position))) << frac;
+        }
+    }
 }
 
 TYPED_TEST(ResampleConstExports, AFailureLeavesTheStateAndEmptiesTheOutput) {
