@@ -79,21 +79,22 @@ int32_t Detect(const KrPeakRecord& record, const In<double>& samples, KrPeakStat
     const bool first_block = (record.flags & KRN_FIRST_BLOCK) != 0;
     if (first_block) {
         if (!work->Make(record.width)) return kOutOfMemory;
-        *state = {};
-        state->width = record.width;
     } else {
         if (!work->exists() || !work->HasWidth(state->width)) return kNoState;
         if (state->held < 0 || state->held > state->width) return kNoState;
     }
-    if (samples.size() < std::max(record.width, state->width)) return kBadWidth;
+    const int32_t points = first_block ? record.width : state->width;
+    if (samples.size() < std::max(record.width, points)) return kBadWidth;
 
-    const auto width = Count(state->width);
+    const auto width = Count(points);
     double* const weights = work->weights();
     double* const window = weights + 3 * width;
     double* const history = window + width;
     double* const previous = history + width;
     if (first_block) {
-        if (const int32_t status = DesignParabolaWeights(record.width, weights)) return status;
+        *state = {};
+        state->width = points;
+        if (const int32_t status = DesignParabolaWeights(points, weights)) return status;
         std::fill_n(previous, 3, 0.0);
     }
     PeakScan scan{.width = state->width,

@@ -400,6 +400,10 @@ TEST_F(PeakFailure, TooFewSamples) {
     ExpectFailure({1, 2, 3, 4}, KRN_FIRST_BLOCK, kBadWidth);
     ExpectFailure({}, KRN_FIRST_BLOCK, kBadWidth);
     Begin();
+    const KrPeakState before = detector_.state();
+    ExpectFailure({1, 2, 3, 4}, KRN_FIRST_BLOCK, kBadWidth);  // no signal begins
+    EXPECT_EQ(std::memcmp(&detector_.state(), &before, sizeof before), 0);
+    Begin();
     ExpectFailure({1, 2, 3, 4}, 0, kBadWidth);
     Begin();
     detector_.record().width = 3;  // what counts is the window that the signal began with
