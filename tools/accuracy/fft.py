@@ -17,6 +17,7 @@ import matplotlib.pyplot as plt  # noqa: E402
 import numpy as np  # noqa: E402
 import scipy.fft  # noqa: E402
 
+import host  # noqa: E402
 import page  # noqa: E402
 
 INTRODUCTION = """\
@@ -51,8 +52,6 @@ KINDS = {
     "53 and above": "#b03020",
 }
 
-COMPLEX, DOUBLE = 13, 10
-
 
 def primes(n):
     found = []
@@ -85,26 +84,14 @@ def written(n):
     return " · ".join(f"{p}{str(k).translate(digits) if k > 1 else ''}" for p, k in powers) or "1"
 
 
-class Library:
-    def __init__(self, build):
-        self.host = ctypes.CDLL(str(build / "host" / "libkrrt.so"), mode=ctypes.RTLD_GLOBAL)
-        self.library = ctypes.CDLL(str(build / "src" / "libkrnumer.so"))
-        self.host.KrrtNewArray.restype = self.host.KrrtElements.restype = ctypes.c_void_p
-        self.host.KrrtElements.argtypes = self.host.KrrtFree.argtypes = [ctypes.c_void_p]
-        self.host.KrrtSize.argtypes = [ctypes.c_void_p, ctypes.c_int32]
-
+class Transforms(host.Library):
     def call(self, export, samples, out_type):
         """The result of an export that takes an array, an array to fill and a table slot."""
-        in_code = COMPLEX if np.iscomplexobj(samples) else DOUBLE
-        out_code = COMPLEX if out_type is complex else DOUBLE
-        x = self.host.KrrtNewArray(in_code, len(samples))
-        y = self.host.KrrtNewArray(out_code, 0)
-        ctypes.memmove(self.host.KrrtElements(x), samples.ctypes.data, samples.nbytes)
-        slot = ctypes.c_void_p()
-        status = getattr(self.library, export)(ctypes.c_void_p(x), ctypes.c_void_p(y), ctypes.byref(slot))
+        x = self.array(samples, samples.dtype)
+        y = self.array(dtype=out_type)
+        status = getattr(self.exports, export)(x, y, ctypes.byref(ctypes.c_void_p()))
         assert status == 0, (export, len(samples), status)
-        result = np.empty(self.host.KrrtSize(y, 0), out_type)
-        ctypes.memmove(result.ctypes.data, self.host.KrrtElements(y), result.nbytes)
+        result = self.values(y, out_type)
         self.host.KrrtFree(x)
         self.host.KrrtFree(y)
         self.host.KrrtCloseInstance(None)  # releases the table
@@ -166,7 +153,7 @@ def tables(errors):
 def main():
     parser = argparse.ArgumentParser(description=__doc__, formatter_class=argparse.RawDescriptionHelpFormatter)
     parser.add_argument("--build", type=pathlib.Path, default=page.ROOT / "build" / "release")
-    library = Library(parser.parse_args().build)
+    library = Transforms(parser.parse_args().build)
     errors = {n: measure(library, n) for n in [*range(1, 2001), *LARGE]}
     picture(errors)
     page.write("transforms", "fft.py", f"{INTRODUCTION}\n{tables(errors)}")
