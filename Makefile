@@ -7,14 +7,14 @@ FUZZ_SECONDS ?= 600
 JOBS ?= $(shell nproc)
 BUILD = build/$(PRESET)
 
-.PHONY: help build test demo docs bench format lint fuzz install package clean
+.PHONY: help build test demo docs bench format lint fuzz coverage install package clean
 
 help:
-	@echo "make test      build and run the whole suite      make demo      report on recorded signals"
-	@echo "make docs      reference as HTML                   make bench     measure beside the peers"
-	@echo "make format    clang-format everything             make lint      clang-format and clang-tidy checks"
-	@echo "make fuzz      look for inputs that break calls"
-	@echo "make install   into PREFIX=$(PREFIX)           make package   Debian packages"
+	@echo "make test     build and run the whole suite    make demo    report on recorded signals"
+	@echo "make docs     reference as HTML                make bench   measure beside the peers"
+	@echo "make format   clang-format everything          make lint    clang-format and clang-tidy checks"
+	@echo "make coverage what the suite reaches           make fuzz    look for inputs that break calls"
+	@echo "make install  into PREFIX=$(PREFIX)            make package Debian packages"
 
 build:
 	tools/setup build
@@ -46,6 +46,10 @@ format:
 lint:
 	tools/setup build test lint
 	tools/lint $(LINT_ARGS)
+
+coverage:
+	tools/setup build test coverage
+	tools/coverage $(JOBS)
 
 fuzz:
 	tools/setup build fuzz

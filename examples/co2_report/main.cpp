@@ -2,11 +2,7 @@
 //
 //     co2_report examples/data/co2.csv report.json
 
-#include <cstdlib>
-#include <exception>
-#include <fstream>
-#include <iostream>
-#include <stdexcept>
+#include <istream>
 #include <string>
 #include <vector>
 
@@ -14,11 +10,9 @@
 
 namespace {
 
-// A year and a value per line, under a heading.
-Record Load(const char* path) {
-    std::ifstream file(path);
+// A year and a value per line.
+Record Load(std::istream& file) {
     std::string line;
-    if (!std::getline(file, line)) throw std::runtime_error(std::string("cannot read ") + path);
     std::vector<double> years, ppm;
     while (std::getline(file, line)) {
         std::size_t comma = 0;
@@ -28,7 +22,8 @@ Record Load(const char* path) {
     return {Array<double>(years), Array<double>(ppm)};
 }
 
-Report Analyse(const Record& record) {
+Report Analyse(std::istream& file) {
+    const Record record = Load(file);
     Report report;
     report.title = "Four decades of carbon dioxide";
     report.text = "Monthly means at Mauna Loa, 1959 to 1997: linear and robust fits, and how sure they are.";
@@ -43,17 +38,5 @@ Report Analyse(const Record& record) {
 }  // namespace
 
 int main(int argc, char** argv) {
-    if (argc != 3) {
-        std::cerr << "usage: co2_report DATA.csv REPORT.json\n";
-        return EXIT_FAILURE;
-    }
-    try {
-        const Report report = Analyse(Load(argv[1]));
-        Print(report, std::cout);
-        WriteJson(report, argv[2]);
-        return EXIT_SUCCESS;
-    } catch (const std::exception& error) {
-        std::cerr << "co2_report: " << error.what() << '\n';
-        return EXIT_FAILURE;
-    }
+    return RunReport(argc, argv, Analyse);
 }

@@ -2,11 +2,7 @@
 //
 //     ecg_report examples/data/ecg.csv report.json
 
-#include <cstdlib>
-#include <exception>
-#include <fstream>
-#include <iostream>
-#include <stdexcept>
+#include <istream>
 #include <string>
 #include <vector>
 
@@ -14,17 +10,16 @@
 
 namespace {
 
-// One sample per line under a heading.
-Recording Load(const char* path) {
-    std::ifstream file(path);
+// One sample per line.
+Recording Load(std::istream& file) {
     std::string line;
-    if (!std::getline(file, line)) throw std::runtime_error(std::string("cannot read ") + path);
     std::vector<double> samples;
     while (std::getline(file, line)) samples.push_back(std::stod(line));
     return {Array<double>(samples), 360.0};
 }
 
-Report Analyse(const Recording& ecg) {
+Report Analyse(std::istream& file) {
+    const Recording ecg = Load(file);
     Report report;
     report.title = "A minute of an electrocardiogram";
     report.text =
@@ -44,17 +39,5 @@ Report Analyse(const Recording& ecg) {
 }  // namespace
 
 int main(int argc, char** argv) {
-    if (argc != 3) {
-        std::cerr << "usage: ecg_report DATA.csv REPORT.json\n";
-        return EXIT_FAILURE;
-    }
-    try {
-        const Report report = Analyse(Load(argv[1]));
-        Print(report, std::cout);
-        WriteJson(report, argv[2]);
-        return EXIT_SUCCESS;
-    } catch (const std::exception& error) {
-        std::cerr << "ecg_report: " << error.what() << '\n';
-        return EXIT_FAILURE;
-    }
+    return RunReport(argc, argv, Analyse);
 }

@@ -1,8 +1,11 @@
 #include "report.h"
 
 #include <algorithm>
+#include <cstdlib>
+#include <exception>
 #include <fstream>
 #include <iomanip>
+#include <iostream>
 #include <nlohmann/json.hpp>
 #include <ostream>
 #include <sstream>
@@ -89,4 +92,23 @@ void WriteJson(const Report& report, const std::string& path) {
     std::ofstream file(path);
     file << nlohmann::json(report);
     if (!file.flush()) throw std::runtime_error("cannot write " + path);
+}
+
+int RunReport(int argc, char** argv, Report (*analyse)(std::istream& data)) {
+    if (argc != 3) {
+        std::cerr << "usage: " << argv[0] << " DATA.csv REPORT.json\n";
+        return EXIT_FAILURE;
+    }
+    try {
+        std::ifstream file(argv[1]);
+        std::string heading;
+        if (!std::getline(file, heading)) throw std::runtime_error(std::string("cannot read ") + argv[1]);
+        const Report report = analyse(file);
+        Print(report, std::cout);
+        WriteJson(report, argv[2]);
+        return EXIT_SUCCESS;
+    } catch (const std::exception& error) {
+        std::cerr << argv[0] << ": " << error.what() << '\n';
+        return EXIT_FAILURE;
+    }
 }

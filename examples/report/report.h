@@ -66,3 +66,7 @@ std::string Number(double value, int digits);
 
 void Print(const Report& report, std::ostream& out);
 void WriteJson(const Report& report, const std::string& path);
+
+// The main program of every report: opens argv[1] behind its heading line, prints the report to standard output and
+// writes it to argv[2].
+int RunReport(int argc, char** argv, Report (*analyse)(std::istream& data));

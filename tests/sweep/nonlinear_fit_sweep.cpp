@@ -8,112 +8,92 @@ const std::vector<double> kX{1, 2, 3, 4, 5};
 const std::vector<double> kY{1.5, 4, 5.5, 4.5, 2};
 const std::vector<double> kW{1, 2, 1, 1, 2};
 
+struct Data {
+    KrHandle y, x, w;
+};
+
+Data Observed(sweep::Scene& scene) {
+    return {scene.Doubles(kY), scene.Doubles(kX), scene.Doubles(kW)};
+}
+
+// Data whose ordinates the fit replaces.
+Data Fitted(sweep::Scene& scene) {
+    return {scene.Replaced(scene.Doubles(kY)), scene.Doubles(kX), scene.Doubles(kW)};
+}
+
 }  // namespace
 
 SWEEP(ExpFit_head) {
     const KrHandle y = scene.Replaced(scene.Doubles(kY));
     const KrHandle x = scene.Doubles(kX);
     const KrHandle sigma = scene.Doubles(kW);
-    double* a = scene.Number();
-    double* b = scene.Number();
-    double* mse = scene.Number();
-    return scene.Call(ExpFit_head, y, x, sigma, a, b, mse);
+    double* const found = scene.Numbers(3);  // a, b, mse
+    return scene.Call(ExpFit_head, y, x, sigma, found, found + 1, found + 2);
 }
 
 SWEEP(ExpFit80_head) {
-    const KrHandle y = scene.Replaced(scene.Doubles(kY));
-    const KrHandle x = scene.Doubles(kX);
-    const KrHandle w = scene.Doubles(kW);
+    const auto [y, x, w] = Fitted(scene);
     const KrHandle init = scene.Doubles({2, 0.1});
-    double* a = scene.Number();
-    double* b = scene.Number();
-    double* mse = scene.Number();
+    double* const found = scene.Numbers(3);  // a, b, mse
     int32_t* iter = scene.Integer(20);
-    return scene.Call(ExpFit80_head, y, x, w, 0.0, init, 1, a, b, mse, iter, 0.0);
+    return scene.Call(ExpFit80_head, y, x, w, 0.0, init, 1, found, found + 1, found + 2, iter, 0.0);
 }
 
 SWEEP(ExpFitCoef_head) {
     const KrHandle y = scene.Doubles(kY);
     const KrHandle x = scene.Doubles(kX);
-    double* a = scene.Number();
-    double* b = scene.Number();
-    return scene.Call(ExpFitCoef_head, y, x, a, b);
+    double* const found = scene.Numbers(2);  // a, b
+    return scene.Call(ExpFitCoef_head, y, x, found, found + 1);
 }
 
 SWEEP(ExpFitCoef80_head) {
-    const KrHandle y = scene.Doubles(kY);
-    const KrHandle x = scene.Doubles(kX);
-    const KrHandle w = scene.Doubles(kW);
+    const auto [y, x, w] = Observed(scene);
     const KrHandle init = scene.Doubles({2, 0.1});
-    double* a = scene.Number();
-    double* b = scene.Number();
+    double* const found = scene.Numbers(2);  // a, b
     int32_t* iter = scene.Integer(20);
-    return scene.Call(ExpFitCoef80_head, y, x, w, 1, 0.0, init, a, b, iter, 0.0);
+    return scene.Call(ExpFitCoef80_head, y, x, w, 1, 0.0, init, found, found + 1, iter, 0.0);
 }
 
 SWEEP(PowerFit_head) {
-    const KrHandle y = scene.Replaced(scene.Doubles(kY));
-    const KrHandle x = scene.Doubles(kX);
-    const KrHandle w = scene.Doubles(kW);
+    const auto [y, x, w] = Fitted(scene);
     const KrHandle init = scene.Doubles({2, 0.1});
-    double* a = scene.Number();
-    double* b = scene.Number();
-    double* mse = scene.Number();
+    double* const found = scene.Numbers(3);  // a, b, mse
     int32_t* iter = scene.Integer(20);
-    return scene.Call(PowerFit_head, y, x, w, 0.0, init, a, b, mse, iter, 0.0);
+    return scene.Call(PowerFit_head, y, x, w, 0.0, init, found, found + 1, found + 2, iter, 0.0);
 }
 
 SWEEP(PowerFitCoef_head) {
-    const KrHandle y = scene.Doubles(kY);
-    const KrHandle x = scene.Doubles(kX);
-    const KrHandle w = scene.Doubles(kW);
+    const auto [y, x, w] = Observed(scene);
     const KrHandle init = scene.Doubles({2, 0.1});
-    double* a = scene.Number();
-    double* b = scene.Number();
+    double* const found = scene.Numbers(2);  // a, b
     int32_t* iter = scene.Integer(20);
-    return scene.Call(PowerFitCoef_head, y, x, w, 0.0, init, a, b, iter, 0.0);
+    return scene.Call(PowerFitCoef_head, y, x, w, 0.0, init, found, found + 1, iter, 0.0);
 }
 
 SWEEP(LogFit_head) {
-    const KrHandle y = scene.Replaced(scene.Doubles(kY));
-    const KrHandle x = scene.Doubles(kX);
-    const KrHandle w = scene.Doubles(kW);
-    double* a = scene.Number();
-    double* b = scene.Number();
-    double* mse = scene.Number();
-    return scene.Call(LogFit_head, y, x, w, 10.0, a, b, mse);
+    const auto [y, x, w] = Fitted(scene);
+    double* const found = scene.Numbers(3);  // a, b, mse
+    return scene.Call(LogFit_head, y, x, w, 10.0, found, found + 1, found + 2);
 }
 
 SWEEP(LogFitCoef_head) {
-    const KrHandle y = scene.Doubles(kY);
-    const KrHandle x = scene.Doubles(kX);
-    const KrHandle w = scene.Doubles(kW);
-    double* a = scene.Number();
-    double* b = scene.Number();
-    return scene.Call(LogFitCoef_head, y, x, w, 10.0, a, b);
+    const auto [y, x, w] = Observed(scene);
+    double* const found = scene.Numbers(2);  // a, b
+    return scene.Call(LogFitCoef_head, y, x, w, 10.0, found, found + 1);
 }
 
 SWEEP(GaussianPeakFit_head) {
-    const KrHandle y = scene.Replaced(scene.Doubles(kY));
-    const KrHandle x = scene.Doubles(kX);
-    const KrHandle w = scene.Doubles(kW);
+    const auto [y, x, w] = Fitted(scene);
     const KrHandle init = scene.Doubles({5, 3, 1});
-    double* a = scene.Number();
-    double* mu = scene.Number();
-    double* sigma = scene.Number();
-    double* mse = scene.Number();
+    double* const found = scene.Numbers(4);  // a, mu, sigma, mse
     int32_t* iter = scene.Integer(20);
-    return scene.Call(GaussianPeakFit_head, y, x, w, 0.0, init, a, mu, sigma, mse, iter, 0.0);
+    return scene.Call(GaussianPeakFit_head, y, x, w, 0.0, init, found, found + 1, found + 2, found + 3, iter, 0.0);
 }
 
 SWEEP(GaussianPeakFitCoef_head) {
-    const KrHandle y = scene.Doubles(kY);
-    const KrHandle x = scene.Doubles(kX);
-    const KrHandle w = scene.Doubles(kW);
+    const auto [y, x, w] = Observed(scene);
     const KrHandle init = scene.Doubles({5, 3, 1});
-    double* a = scene.Number();
-    double* mu = scene.Number();
-    double* sigma = scene.Number();
+    double* const found = scene.Numbers(3);  // a, mu, sigma
     int32_t* iter = scene.Integer(20);
-    return scene.Call(GaussianPeakFitCoef_head, y, x, w, 0.0, init, a, mu, sigma, iter, 0.0);
+    return scene.Call(GaussianPeakFitCoef_head, y, x, w, 0.0, init, found, found + 1, found + 2, iter, 0.0);
 }
