@@ -17,7 +17,7 @@
  *
  * A table slot is a pointer cell of the caller, one per call site, that starts as null. The library keeps there the
  * tables of the last length asked for, and has the host release them with the calling instance. Calls at one slot must
- * not overlap in time; otherwise any number of threads may call.
+ * not overlap in time; otherwise any number of threads may call. Long transforms take up to 300 KiB of their stack.
  *
  * Unless a function says otherwise, the checks of its arguments leave the output as it is, and any failure after the
  * output was resized leaves it empty. Input and output may be the same array.

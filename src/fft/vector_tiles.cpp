@@ -138,12 +138,13 @@ void RunStage(const qmfft_table* table, const Pass& pass, int32_t i, int32_t sta
     const int32_t rows = RowsBehind(table, pass, i);
     const auto call = static_cast<ptrdiff_t>(PackedCount<T>(count, r));
     const double* packed = kIsReal<T> ? table->stages[i]->packedReal : table->stages[i]->packedComplex;
+    const double* end = packed + static_cast<ptrdiff_t>(PackedCount<T>(pass.columns, r)) * rows;
     packed += static_cast<ptrdiff_t>(PackedCount<T>(start, r)) * rows;
     for (int32_t row = 0; row < pass.rows; row += r * rows) {
         double* block = tile + RowInTile(table, pass, row);
         const double* w = packed;
         for (int32_t c = 0; c < rows; ++c, w += call) {
-            Prefetch(w + call, call);
+            Prefetch(w + call, std::min(call, end - (w + call)));
             if constexpr (kIsReal<T>) {
                 double* a = block + RowInTile(table, pass, c / 2);
                 double* b = block + RowInTile(table, pass, rows - 1 - c / 2);
