@@ -34,15 +34,19 @@ int32_t SavitzkyGolayMatrices(int32_t order, int32_t frame, const double* weight
 
     // Powers of t / half instead of t, which all have about the same size: the normal equations of the powers of t
     // would lose all digits at higher orders.
+    int32_t weighing = 0;
     for (size_t i = 0; i < rows; ++i) {
         const double t = (static_cast<double>(i) - half) / half;
         const double weight = weights != nullptr ? std::fabs(weights[i]) : 1.0;
+        if (weight != 0.0) ++weighing;
         double power = 1.0;
         for (size_t k = 0; k < columns; ++k, power *= t) {
             powers[i * columns + k] = power;
             weighted[k * rows + i] = weight * power;
         }
     }
+    // The normal equations are singular then, which the rounding of their factor may hide.
+    if (weighing < terms) return kNotPositiveDefinite;
     if (const int32_t status = MatMulCore(weighted.data(), powers.data(), terms, frame, terms, normal.data()))
         return status;
     if (const int32_t status = CholeskySolveFull(normal.data(), terms, kLower, weighted.data(), frame, solution.data()))

@@ -251,6 +251,7 @@ TEST(SavitzkyGolayCoef, RefusesInAFixedOrder) {
     EXPECT_EQ(made.Refusal(2, 4, {}, 0), kEvenLength);
     EXPECT_EQ(made.Refusal(1, 3, {1.0, 0.0, 0.0}), kNotPositiveDefinite);
     EXPECT_EQ(made.Refusal(1, 3, {0.0, 0.0, 0.0}), kNotPositiveDefinite);
+    EXPECT_EQ(made.Refusal(2, 5, {1.0, 0.0, 0.0, 0.0, 1.0}), kNotPositiveDefinite);
     EXPECT_EQ(made.Refusal(1, 3, {1.0, kQuietNaN, 1.0}), kNotFinite);
     EXPECT_EQ(made.Refusal(1, kMost), kOutOfMemory);
     for (const int32_t nth : {1, 2}) {
