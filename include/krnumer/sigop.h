@@ -266,8 +266,8 @@ typedef struct KrResampleState {
     double gain;          /**< factor of the outputs */
     int32_t left;         /**< samples under the kernel up to the position of an output */
     int32_t right;        /**< and behind it */
-    int32_t mode;         /**< from the specification */
-    double ratio;         /**< from the specification */
+    int32_t mode;         /**< of KrResampleSpec */
+    double ratio;         /**< of KrResampleSpec */
     double frac;          /**< the next output stands at index + frac, */
     int32_t index;        /**< counted from the first sample kept */
 } KrResampleState;
