@@ -21,7 +21,7 @@ struct Transformed {
 };
 
 inline std::vector<Transformed> Reference(const std::string& kind) {
-    std::ifstream in(std::string(KRNUMER_REFERENCE) + "/transform.csv");
+    std::ifstream in(KRNUMER_REFERENCE "/transform.csv");
     std::vector<Transformed> all;
     for (std::string line; std::getline(in, line);) {
         std::istringstream cells(line);
