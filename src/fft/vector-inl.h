@@ -14,8 +14,7 @@
 #include "hwy/highway.h"
 
 HWY_BEFORE_NAMESPACE();
-namespace krnumer {
-namespace HWY_NAMESPACE {
+namespace krnumer::HWY_NAMESPACE {
 
 namespace hn = hwy::HWY_NAMESPACE;
 
@@ -211,8 +210,7 @@ KRNUMER_FFT_INLINE void Transpose(hn::Vec<Tag<N>>* rows) {
 
 #endif  // KRNUMER_FFT_HAS_VECTORS
 
-}  // namespace HWY_NAMESPACE
-}  // namespace krnumer
+}  // namespace krnumer::HWY_NAMESPACE
 HWY_AFTER_NAMESPACE();
 
 #endif

@@ -14,8 +14,7 @@
 #include "frame/numeric.h"
 
 HWY_BEFORE_NAMESPACE();
-namespace krnumer {
-namespace HWY_NAMESPACE {
+namespace krnumer::HWY_NAMESPACE {
 
 #if KRNUMER_FFT_HAS_VECTORS
 
@@ -337,8 +336,7 @@ inline constexpr VectorButterflies kVectorButterflies{{Columns<r, Complex>, Comp
 
 #endif  // KRNUMER_FFT_HAS_VECTORS
 
-}  // namespace HWY_NAMESPACE
-}  // namespace krnumer
+}  // namespace krnumer::HWY_NAMESPACE
 HWY_AFTER_NAMESPACE();
 
 #endif

@@ -11,15 +11,13 @@
 #include "fft/vector-inl.h"
 
 HWY_BEFORE_NAMESPACE();
-namespace krnumer {
-namespace HWY_NAMESPACE {
+namespace krnumer::HWY_NAMESPACE {
 
 int32_t Lanes() {
     return KRNUMER_FFT_HAS_VECTORS ? static_cast<int32_t>(kLanes) : 0;
 }
 
-}  // namespace HWY_NAMESPACE
-}  // namespace krnumer
+}  // namespace krnumer::HWY_NAMESPACE
 HWY_AFTER_NAMESPACE();
 
 #if HWY_ONCE

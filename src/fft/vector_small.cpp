@@ -8,8 +8,7 @@
 #include "fft/vector_kernels-inl.h"
 
 HWY_BEFORE_NAMESPACE();
-namespace krnumer {
-namespace HWY_NAMESPACE {
+namespace krnumer::HWY_NAMESPACE {
 
 const VectorButterflies* SmallRadix([[maybe_unused]] int32_t radix) {
 #if KRNUMER_FFT_HAS_VECTORS
@@ -39,8 +38,7 @@ const VectorButterflies* SmallRadix([[maybe_unused]] int32_t radix) {
     return nullptr;
 }
 
-}  // namespace HWY_NAMESPACE
-}  // namespace krnumer
+}  // namespace krnumer::HWY_NAMESPACE
 HWY_AFTER_NAMESPACE();
 
 #if HWY_ONCE

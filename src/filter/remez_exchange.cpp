@@ -152,12 +152,10 @@ void RemezExchange::MovePoints() {
             low = point;
             point = found_;
             ++changes_;
-        } else if (down == Search::kStopped) {
-            low = point;
-        } else if (changes_ != 0) {
+        } else if (down != Search::kStopped && changes_ != 0) {
             low = point;
             ++changes_;
-        } else if (SearchUp(point + 1, high)) {
+        } else if (down != Search::kStopped && SearchUp(point + 1, high)) {
             low = point = found_;
             changes_ = 1;
         } else {

@@ -92,9 +92,8 @@ bool FindPositions(const ResampleGroup& group, Outputs& outputs, Rows& rows) {
     if (!(*least >= 2.0 && *most <= std::min<double>(kMostTaps, group.most_taps))) return false;
     outputs.least = static_cast<int64_t>(*least);
     outputs.most = static_cast<int64_t>(*most);
-    for (int32_t k = 0; k < kGroup; ++k) {
-        if (!(outputs.first[k] >= 0.0 && outputs.first[k] + *most <= group.n)) return false;
-    }
+    const auto lies_inside = [&](double first) { return first >= 0.0 && first + *most <= group.n; };
+    if (!std::all_of(outputs.first, outputs.first + kGroup, lies_inside)) return false;
 
     for (size_t k = 0; k < kGroup; k += hn::Lanes(tag)) {
         Vector position = hn::Load(tag, rows.row[0] + k);

@@ -138,7 +138,7 @@ TEST(MedianFilter, LeavesTheSignalWithoutAWindow) {
 }
 
 TEST(MedianFilter, RefusesInAFixedOrder) {
-    const auto status = [](std::vector<double> samples, int32_t left, int32_t right) {
+    const auto status = [](const std::vector<double>& samples, int32_t left, int32_t right) {
         HostArray<double> x(samples);
         const int32_t result = MedianFilter81_H(x.handle(), left, right);
         EXPECT_TRUE(x.empty());
@@ -228,7 +228,9 @@ TEST(SavitzkyGolayCoef, ProjectsAtHighOrders) {
         const std::vector<double> s = made.smoothing.values();
         for (std::size_t i = 0; i < size; ++i) {
             double sum_of_power = 0.0;
-            const auto t = [&](std::size_t j) { return (static_cast<double>(j) - frame / 2) / (frame / 2.0); };
+            const auto t = [middle = frame / 2](std::size_t j) {
+                return (static_cast<double>(j) - middle) / (middle + 0.5);
+            };
             for (std::size_t j = 0; j < size; ++j) sum_of_power += s[i * size + j] * std::pow(t(j), order);
             EXPECT_NEAR(sum_of_power, std::pow(t(i), order), 1e-9);
             for (std::size_t j = 0; j < size; ++j) {

@@ -16,7 +16,6 @@
 namespace krnumer {
 namespace {
 
-using testing::ElementsAre;
 using testing::IsEmpty;
 
 using Samples = std::vector<double>;
@@ -411,7 +410,7 @@ TEST_F(PeakFailure, TooFewSamples) {
 }
 
 TEST_F(PeakFailure, NoWorkBlock) {
-    const auto refuse = [this](Samples samples) {
+    const auto refuse = [this](const Samples& samples) {
         const FailBlock refused;
         ExpectFailure(samples, KRN_FIRST_BLOCK, kOutOfMemory);
     };

@@ -98,7 +98,7 @@ TEST_F(ThresholdPeaks, TheHostIsAskedForDoubles) {
 
 TEST_F(ThresholdPeaks, Refusals) {
     const double threshold = 1;
-    const auto expect = [&](std::vector<double> samples, int32_t width, int32_t status) {
+    const auto expect = [&](const std::vector<double>& samples, int32_t width, int32_t status) {
         HostArray<double> x(samples);
         HostArray<int32_t> indices{1, 2, 3};
         EXPECT_EQ(PeakDetector(x.handle(), &threshold, &width, indices.handle(), &count_, &err_), 0);

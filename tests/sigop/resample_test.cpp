@@ -17,7 +17,6 @@ namespace krnumer {
 namespace {
 
 using testing::ElementsAre;
-using testing::IsEmpty;
 
 const Golden& Reference() {
     static const Golden golden("resample");

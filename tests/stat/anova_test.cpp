@@ -18,9 +18,6 @@
 namespace krnumer {
 namespace {
 
-using testing::Each;
-using testing::Pointwise;
-using testing::ResultOf;
 
 struct OneWay {
     double ss_between = -9, ms_between = -9, f = -9, p = -9, ss_within = -9, ms_within = -9, ss_total = -9;

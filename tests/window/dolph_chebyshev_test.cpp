@@ -14,7 +14,6 @@
 namespace krnumer {
 namespace {
 
-using ::testing::Each;
 using ::testing::ElementsAre;
 
 std::vector<double> DolphChebyshev(int32_t n, double ratio, bool symmetric) {
