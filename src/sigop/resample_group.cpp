@@ -92,7 +92,7 @@ bool FindPositions(const ResampleGroup& group, Outputs& outputs, Rows& rows) {
     if (!(*least >= 2.0 && *most <= std::min<double>(kMostTaps, group.most_taps))) return false;
     outputs.least = static_cast<int64_t>(*least);
     outputs.most = static_cast<int64_t>(*most);
-    const auto lies_inside = [&](double first) { return first >= 0.0 && first + *most <= group.n; };
+    const auto lies_inside = [taps = *most, n = group.n](double first) { return first >= 0.0 && first + taps <= n; };
     if (!std::all_of(outputs.first, outputs.first + kGroup, lies_inside)) return false;
 
     for (size_t k = 0; k < kGroup; k += hn::Lanes(tag)) {

@@ -18,7 +18,6 @@
 namespace krnumer {
 namespace {
 
-
 struct OneWay {
     double ss_between = -9, ms_between = -9, f = -9, p = -9, ss_within = -9, ms_within = -9, ss_total = -9;
     int32_t err = 77;
