@@ -1,5 +1,6 @@
 #include "sweep/sweep.h"
 
+#include <algorithm>
 #include <bit>
 #include <cmath>
 #include <cstdio>
@@ -70,17 +71,14 @@ KrHandle Scene::NewRecords(int32_t bytes, int32_t count, const void* elements) {
 }
 
 KrHandle Scene::Alias(KrHandle handle) {
-    const auto same_kind = [this](KrHandle a, KrHandle b) {
-        int32_t code[2] = {kRecords, kRecords};
-        for (const Array& array : arrays_) {
-            if (array.handle == a) code[0] = array.type_code;
-            if (array.handle == b) code[1] = array.type_code;
-        }
-        return code[0] != kRecords && code[0] == code[1] && KrrtRank(a) == KrrtRank(b);
-    };
     const size_t other = variation_->Choice(arrays_.size() + 1);
-    if (other == 0 || !same_kind(handle, arrays_[other - 1].handle)) return handle;
-    return arrays_[other - 1].handle;
+    const auto array = std::ranges::find(arrays_, handle, &Array::handle);
+    if (other == 0 || array == arrays_.end()) return handle;
+    const Array& candidate = arrays_[other - 1];
+    const bool same_kind = array->type_code != kRecords && array->type_code == candidate.type_code &&
+                           KrrtRank(handle) == KrrtRank(candidate.handle);
+    // What two outputs in one array leave there is nobody's promise.
+    return same_kind && !(array->output && candidate.output) ? candidate.handle : handle;
 }
 
 KrHandle Scene::NewOutput(int32_t type_code, int rank, OnFailure on_failure) {
