@@ -1,5 +1,7 @@
 #include "krnumer/fit_bounds.h"
 
+#include <utility>
+
 #include "sweep/sweep.h"
 
 namespace {
@@ -22,76 +24,66 @@ struct Bounds {
     KrHandle upper, lower;
 };
 
+constexpr std::make_index_sequence<2> kTwo;
+constexpr std::make_index_sequence<3> kThree;
+
+// The half widths of the coefficients' intervals are 0 after a failure.
+template <class Function, size_t... kCoefficient, class... Model>
+int32_t PlayConfidence(sweep::Scene& scene, Function* bounds, std::index_sequence<kCoefficient...>, Model... model) {
+    const auto [y, x, w] = Observed(scene);
+    const Bounds of_fit(scene), of_coefficients(scene);
+    double* const half_widths = scene.Numbers(sizeof...(kCoefficient), sweep::OnFailure::kOther);
+    return scene.Call(bounds, y, x, w, model..., 0.9, of_fit.upper, of_fit.lower, of_coefficients.upper,
+                      of_coefficients.lower, (half_widths + kCoefficient)...);
+}
+
+template <class Function, class... Model>
+int32_t PlayPrediction(sweep::Scene& scene, Function* bounds, Model... model) {
+    const auto [y, x, w] = Observed(scene);
+    const Bounds of_fit(scene);
+    return scene.Call(bounds, y, x, w, model..., 0.9, of_fit.upper, of_fit.lower);
+}
+
 }  // namespace
 
 SWEEP(ConfBndLinear_head) {
-    const auto [y, x, w] = Observed(scene);
-    const Bounds of_fit(scene), of_coefficients(scene);
-    double* const found = scene.Numbers(2, sweep::OnFailure::kOther);  // d_slope, d_intercept
-    return scene.Call(ConfBndLinear_head, y, x, w, 1.5, 0.5, 0.9, of_fit.upper, of_fit.lower, of_coefficients.upper,
-                      of_coefficients.lower, found, found + 1);
+    return PlayConfidence(scene, ConfBndLinear_head, kTwo, 1.5, 0.5);
 }
 
 SWEEP(ConfBndExp_head) {
-    const auto [y, x, w] = Observed(scene);
-    const Bounds of_fit(scene), of_coefficients(scene);
-    double* const found = scene.Numbers(2, sweep::OnFailure::kOther);  // d_a, d_b
-    return scene.Call(ConfBndExp_head, y, x, w, 2.0, 0.2, 0.9, of_fit.upper, of_fit.lower, of_coefficients.upper,
-                      of_coefficients.lower, found, found + 1);
+    return PlayConfidence(scene, ConfBndExp_head, kTwo, 2.0, 0.2);
 }
 
 SWEEP(ConfBndPower_head) {
-    const auto [y, x, w] = Observed(scene);
-    const Bounds of_fit(scene), of_coefficients(scene);
-    double* const found = scene.Numbers(2, sweep::OnFailure::kOther);  // d_a, d_b
-    return scene.Call(ConfBndPower_head, y, x, w, 1.5, 0.7, 0.9, of_fit.upper, of_fit.lower, of_coefficients.upper,
-                      of_coefficients.lower, found, found + 1);
+    return PlayConfidence(scene, ConfBndPower_head, kTwo, 1.5, 0.7);
 }
 
 SWEEP(ConfBndLog_head) {
-    const auto [y, x, w] = Observed(scene);
-    const Bounds of_fit(scene), of_coefficients(scene);
-    double* const found = scene.Numbers(2, sweep::OnFailure::kOther);  // d_a, d_b
-    return scene.Call(ConfBndLog_head, y, x, w, 10.0, 4.0, 2.0, 0.9, of_fit.upper, of_fit.lower, of_coefficients.upper,
-                      of_coefficients.lower, found, found + 1);
+    return PlayConfidence(scene, ConfBndLog_head, kTwo, 10.0, 4.0, 2.0);
 }
 
 SWEEP(ConfBndGauss_head) {
-    const auto [y, x, w] = Observed(scene);
-    const Bounds of_fit(scene), of_coefficients(scene);
-    double* const found = scene.Numbers(3, sweep::OnFailure::kOther);  // d_a, d_mu, d_sigma
-    return scene.Call(ConfBndGauss_head, y, x, w, 5.0, 3.0, 1.5, 0.9, of_fit.upper, of_fit.lower, of_coefficients.upper,
-                      of_coefficients.lower, found, found + 1, found + 2);
+    return PlayConfidence(scene, ConfBndGauss_head, kThree, 5.0, 3.0, 1.5);
 }
 
 SWEEP(PredBndLinear_head) {
-    const auto [y, x, w] = Observed(scene);
-    const Bounds bounds(scene);
-    return scene.Call(PredBndLinear_head, y, x, w, 1.5, 0.5, 0.9, bounds.upper, bounds.lower);
+    return PlayPrediction(scene, PredBndLinear_head, 1.5, 0.5);
 }
 
 SWEEP(PredBndExp_head) {
-    const auto [y, x, w] = Observed(scene);
-    const Bounds bounds(scene);
-    return scene.Call(PredBndExp_head, y, x, w, 2.0, 0.2, 0.9, bounds.upper, bounds.lower);
+    return PlayPrediction(scene, PredBndExp_head, 2.0, 0.2);
 }
 
 SWEEP(PredBndPower_head) {
-    const auto [y, x, w] = Observed(scene);
-    const Bounds bounds(scene);
-    return scene.Call(PredBndPower_head, y, x, w, 1.5, 0.7, 0.9, bounds.upper, bounds.lower);
+    return PlayPrediction(scene, PredBndPower_head, 1.5, 0.7);
 }
 
 SWEEP(PredBndLog_head) {
-    const auto [y, x, w] = Observed(scene);
-    const Bounds bounds(scene);
-    return scene.Call(PredBndLog_head, y, x, w, 10.0, 4.0, 2.0, 0.9, bounds.upper, bounds.lower);
+    return PlayPrediction(scene, PredBndLog_head, 10.0, 4.0, 2.0);
 }
 
 SWEEP(PredBndGauss_head) {
-    const auto [y, x, w] = Observed(scene);
-    const Bounds bounds(scene);
-    return scene.Call(PredBndGauss_head, y, x, w, 5.0, 3.0, 1.5, 0.9, bounds.upper, bounds.lower);
+    return PlayPrediction(scene, PredBndGauss_head, 5.0, 3.0, 1.5);
 }
 
 SWEEP(GoodnessOfFit_head) {
