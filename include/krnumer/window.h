@@ -238,13 +238,14 @@ KRNUMER_API int32_t CxGaussWinH(KrHandle x, double sigma, int32_t symmetric);
 
 /**
  * Dolph-Chebyshev window, whose side lobes all have one height, divided by its greatest weight (C. L. Dolph, Proc. IRE
- * 34, 335, 1946). The work grows as n^2.
+ * 34, 335, 1946): the Fourier transform of samples of a Chebyshev polynomial.
  *
  * @param[in,out] x          samples
  * @param[in]     ratio      height of the main lobe over that of the side lobes; below 1, or NaN, means 1; above
  *                           1.3e154 the weights are NaN
  * @param[in]     symmetric  0: the symmetric window of n + 1 without its last weight; else the symmetric window
- * @return                   0; -20003 when `x` is empty; -20001 without memory for the weights
+ * @return                   0; -20003 when `x` is empty; -20001 without memory for the weights, or
+ *                           where their spectrum has more than 2^31 - 1 terms
  */
 KRNUMER_API int32_t DolChebyWinH(KrHandle x, double ratio, int32_t symmetric);
 

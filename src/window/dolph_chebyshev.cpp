@@ -3,7 +3,9 @@
 #include <algorithm>
 #include <cmath>
 #include <cstddef>
+#include <limits>
 
+#include "fft/fft.h"
 #include "frame/numeric.h"
 #include "frame/scratch.h"
 #include "frame/status.h"
@@ -23,46 +25,34 @@ std::int32_t GenerateDolphChebyshev(double* w, std::ptrdiff_t m, double ratio) {
     const double stretch = std::cosh(InverseCosh(ratio) / degree);
     const std::ptrdiff_t half = (m - 1) / 2;
 
-    // spectrum[k-1] for k from 1 to half, and behind it cos(pi r / m) for r below 2m
-    Scratch<double> work(static_cast<std::size_t>(half + 2 * m));
-    if (!work) return kOutOfMemory;
-    double* const spectrum = work.data();
-    double* const cosines = spectrum + half;
+    // The weights lie at d = j - (m - 1) / 2 from the middle, between samples where m is even: there every other term of
+    // a transform of twice the length is theirs.
+    const std::ptrdiff_t doubled = m % 2 == 0 ? 1 : 2;
+    const std::ptrdiff_t length = 2 * m / doubled;
+    if (length > std::numeric_limits<std::int32_t>::max()) return kOutOfMemory;
+    const HeldTable table(static_cast<std::int32_t>(length));
+    Scratch<double> spectrum(static_cast<std::size_t>(length), Scratch<double>::kZeroed);
+    Scratch<double> sums(static_cast<std::size_t>(length));
+    if (!table || !spectrum || !sums) return kOutOfMemory;
 
     const double phi = kPi / static_cast<double>(m);
     const double twice_cos_phi = 2.0 * std::cos(phi);
     double cosine = std::cos(phi), next = std::cos(2.0 * phi);
-    for (std::ptrdiff_t k = 0; k < half; ++k) {
+    double* const samples = spectrum.data();
+    samples[0] = ratio;
+    for (std::ptrdiff_t k = 1; k <= half; ++k) {
         const double t = stretch * cosine;
-        spectrum[k] = std::fabs(t) > 1.0 ? std::cosh(InverseCosh(t) * degree) : std::cos(std::acos(t) * degree);
+        samples[k] = std::fabs(t) > 1.0 ? std::cosh(InverseCosh(t) * degree) : std::cos(std::acos(t) * degree);
+        samples[length - k] = samples[k];
         const double after = twice_cos_phi * next - cosine;
         cosine = next;
         next = after;
     }
 
-    for (std::ptrdiff_t r = 0; r <= m; ++r)
-        cosines[r] = std::cos(static_cast<double>(r) * kPi / static_cast<double>(m));
-    for (std::ptrdiff_t r = m + 1; r < 2 * m; ++r) cosines[r] = cosines[2 * m - r];
-
-    // The angle of cos(2 k d pi / m), with d = j - (m - 1) / 2, is a multiple of pi / m: the table has them all. A few
-    // weights are summed side by side, each in the order of k, so that the additions need not wait for one another.
-    constexpr std::ptrdiff_t kTogether = 4;
-    for (std::ptrdiff_t first = 0; first <= half; first += kTogether) {
-        std::ptrdiff_t step[kTogether], r[kTogether] = {};
-        double sum[kTogether] = {};
-        for (std::ptrdiff_t l = 0; l < kTogether; ++l) step[l] = m - 1 - 2 * std::min(first + l, half);
-        for (std::ptrdiff_t k = 0; k < half; ++k) {
-            for (std::ptrdiff_t l = 0; l < kTogether; ++l) {
-                r[l] += step[l];
-                if (r[l] >= 2 * m) r[l] -= 2 * m;
-                sum[l] += cosines[r[l]] * spectrum[k];
-            }
-        }
-        for (std::ptrdiff_t l = 0; l < kTogether; ++l) {
-            const std::ptrdiff_t j = std::min(first + l, half);
-            w[j] = w[m - 1 - j] = (2.0 * sum[l] + ratio) / static_cast<double>(m);
-        }
-    }
+    const auto n = static_cast<std::int32_t>(length);
+    if (const std::int32_t status = RealFFT(table.get(), samples, sums.data(), 1, 1, n)) return status;
+    for (std::ptrdiff_t j = 0; j <= half; ++j)
+        w[j] = w[m - 1 - j] = sums[static_cast<std::size_t>((m - 1 - 2 * j) / doubled)] / static_cast<double>(m);
     return kOk;
 }
 
