@@ -3,7 +3,7 @@
 #include <algorithm>
 #include <type_traits>
 
-#include "filter/double_pair.h"
+#include "frame/pair.h"
 #include "frame/status.h"
 
 namespace krnumer {
@@ -63,7 +63,7 @@ class Pipeline {
 
     // All sections, at every step that has a sample for each.
     void StepAll() {
-        DoublePair a[kPairs][kOrder], b[kPairs][kOrder + 1], w[kPairs][kOrder], v[kPairs];
+        Pair a[kPairs][kOrder], b[kPairs][kOrder + 1], w[kPairs][kOrder], v[kPairs];
         for (int32_t r = 0; r < kPairs; ++r) {
             for (int32_t i = 0; i < kOrder; ++i) {
                 a[r][i] = Gather(r, [&](int32_t k) { return ForAllParts(a_[k * kOrder + i]); });
@@ -75,11 +75,11 @@ class Pipeline {
         }
         constexpr int32_t kLast = kSections - 1;
         for (int32_t i = kLast; i < n_; ++i) {
-            for (int32_t r = kPairs - 1; r > 0; --r) v[r] = kReal ? DoublePair{v[r - 1][1], v[r][0]} : v[r - 1];
+            for (int32_t r = kPairs - 1; r > 0; --r) v[r] = kReal ? Pair{v[r - 1][1], v[r][0]} : v[r - 1];
             if constexpr (kReal) {
-                v[0] = DoublePair{x_[i], v[0][0]};
+                v[0] = Pair{x_[i], v[0][0]};
             } else {
-                v[0] = DoublePair{x_[i].re, x_[i].im};
+                v[0] = Pair{x_[i].re, x_[i].im};
             }
             for (int32_t r = 0; r < kPairs; ++r) v[r] = Step<kOrder>(v[r], a[r], b[r], w[r]);
             x_[i - kLast] = Of(kLast, v[kPairs - 1]);
@@ -93,17 +93,17 @@ class Pipeline {
 
     // The values that the sections of a pair have among those of all sections.
     template <class Values>
-    static DoublePair Gather(int32_t r, Values values) {
+    static Pair Gather(int32_t r, Values values) {
         if constexpr (kReal) {
-            return DoublePair{values(2 * r), 2 * r + 1 < kSections ? values(2 * r + 1) : 0.0};
+            return Pair{values(2 * r), 2 * r + 1 < kSections ? values(2 * r + 1) : 0.0};
         } else {
             const Complex value = values(r);
-            return DoublePair{value.re, value.im};
+            return Pair{value.re, value.im};
         }
     }
 
     // What belongs to a section in its pair.
-    static Signal Of(int32_t k, DoublePair pair) {
+    static Signal Of(int32_t k, Pair pair) {
         if constexpr (kReal) {
             return pair[k % 2];
         } else {

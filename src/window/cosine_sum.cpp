@@ -8,9 +8,9 @@
 #include <numeric>
 
 #include "frame/numeric.h"
+#include "frame/pair.h"
 #include "frame/scratch.h"
 #include "frame/status.h"
-#include "window/pair.h"
 #include "window/type.h"
 
 namespace krnumer {

@@ -1,4 +1,5 @@
-// Two doubles that are added and multiplied side by side.
+// Two doubles in one register, that are added and multiplied side by side. Every 64-bit processor has such registers, so
+// code that uses them needs no choice at run time.
 #pragma once
 
 #include <cstring>
