@@ -32,6 +32,18 @@ double BesselK1(double x) {
     return std::exp(-x) * ChebyshevSum(8.0 / x - 2.0, kK1B) / std::sqrt(x);
 }
 
+// The orders 0 and 1, from which the recurrence starts.
+struct Orders {
+    double zero, one;
+};
+
+Orders BesselK01(double x) {
+    if (x <= 2.0) return {BesselK0(x), BesselK1(x)};
+    const Pair sums = ChebyshevSums(8.0 / x - 2.0, kK0B, kK1B);
+    const double decay = std::exp(-x), root = std::sqrt(x);
+    return {decay * sums[0] / root, decay * sums[1] / root};
+}
+
 // Where to start the downward recurrence for I_n(x): at 2 (n + sqrt(100 n)), or nearer where that changes nothing. From
 // n on every order divides the error of the start by the square of x / (n + sqrt(n^2 + x^2)), at least
 // (D. E. Amos, Computation of modified Bessel functions and their ratios, 1974).
@@ -125,14 +137,13 @@ double BesselK(int32_t n, double x) {
     if (x < 0.0) return DomainError(kQuietNaN);
     const double order = std::abs(static_cast<double>(n));
     if (order == 0.0) return BesselK0(x);
-    double value = BesselK1(x);
-    if (order == 1.0) return value;
-    double below = BesselK0(x);
-    for (double j = 1.0; j < order; j += 1.0) {
+    if (order == 1.0) return BesselK1(x);
+    auto [below, value] = BesselK01(x);
+    if (value == 0.0) return 0.0;
+    for (double j = 1.0; j < order && value < kInfinity; j += 1.0) {
         const double above = 2.0 * j / x * value + below;
         below = value;
         value = above;
-        if (!std::isfinite(value) || (value == 0.0 && below == 0.0)) break;
     }
     return value;
 }

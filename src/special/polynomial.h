@@ -6,6 +6,7 @@
 #include <cstdint>
 
 #include "frame/numeric.h"
+#include "frame/pair.h"
 
 namespace krnumer {
 
@@ -25,16 +26,17 @@ inline double PolyEvalMonic(double x, const double* table, int32_t degree) {
     return sum;
 }
 
-// Clenshaw's recurrence for the sum of coefficients times Chebyshev polynomials in x / 2, x in -2 to 2. The constant
-// term, the last entry, counts by half.
-inline double ChebyshevSum(double x, const double* table, int32_t count) {
-    double sum = table[0], before = 0.0, before_that = 0.0;
+// Clenshaw's recurrence for twice the sum of coefficients times Chebyshev polynomials in x / 2, x in -2 to 2. The
+// constant term, the last, counts by half.
+template <class V, class Coefficient>
+V Clenshaw(V x, int32_t count, Coefficient coefficient) {
+    V sum = coefficient(0), before = {}, before_that = {};
     for (int32_t i = 1; i < count; ++i) {
         before_that = before;
         before = sum;
-        sum = x * before - before_that + table[i];
+        sum = x * before - before_that + coefficient(i);
     }
-    return 0.5 * (sum - before_that);
+    return sum - before_that;
 }
 
 // The degree, or the count, of a whole table.
@@ -50,7 +52,14 @@ double PolyEvalMonic(double x, const double (&table)[n]) {
 
 template <size_t n>
 double ChebyshevSum(double x, const double (&table)[n]) {
-    return ChebyshevSum(x, table, static_cast<int32_t>(n));
+    return 0.5 * Clenshaw(x, static_cast<int32_t>(n), [&](int32_t i) { return table[i]; });
+}
+
+// The sums of two tables side by side, in the time of one: every step of the recurrence waits for the one before.
+template <size_t n>
+Pair ChebyshevSums(double x, const double (&first)[n], const double (&second)[n]) {
+    const auto coefficients = [&](int32_t i) { return Pair{first[i], second[i]}; };
+    return Pair{0.5, 0.5} * Clenshaw(Pair{x, x}, static_cast<int32_t>(n), coefficients);
 }
 
 }  // namespace krnumer
