@@ -61,8 +61,7 @@ int32_t SymEvectorEvalue_head(KrHandle a, const int32_t* want_vectors, KrHandle 
     InOutMatrix<double> matrix(call, a);
     Out<double> values(call, w);
     if (!IsSquare(matrix)) return call.Fail(kNotSquare);
-    const int32_t n = matrix.rows();
-    if (n < 1) return call.Fail(kEmptyInput);
+    const int32_t n = matrix.rows();  // a matrix without elements is the core's to refuse
     if (values.Resize(n) || call.Map()) return call.Fail(kOutOfMemory);
     const int32_t status = SymEigenCore(matrix.data(), n, *want_vectors, values.data(), nullptr);
     return DeliverVectors(call, status, *want_vectors, matrix);

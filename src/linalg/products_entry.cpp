@@ -66,7 +66,7 @@ int32_t VectorTimesMatrix(KrHandle x, KrHandle a, KrHandle y) {
     In<T> vector(call, x);
     InMatrix<T> matrix(call, a);
     Out<T> product(call, y);
-    if (IsNegative(matrix)) return call.Fail(kEmptyInput);
+    if (vector.size() < 0 || IsNegative(matrix)) return call.Fail(kEmptyInput);
     if (vector.size() != matrix.rows()) return call.Fail(kSizesDiffer);
     if (product.Resize(matrix.columns())) return call.Fail(kOutOfMemory);
     return call.Run(

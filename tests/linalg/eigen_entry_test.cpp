@@ -211,6 +211,12 @@ TEST(SymEvectorEvalue_head, EmptiesBothOnFailure) {
     expect_failure(a, 3, kBadSelector);
 }
 
+TEST(SymEvectorEvalue_head, SizesTheValuesBeforeItMissesTheElements) {
+    FailResize refuse(1, 7, KRRT_RESIZES);
+    EXPECT_EQ(Symmetric(DenseMatrix<double>(0, 0), 0).err, kOutOfMemory);
+    EXPECT_TRUE(refuse.happened());
+}
+
 struct Polynomial {
     explicit Polynomial(const DenseMatrix<double>& a) {
         HostMatrix<double> input = Host(a);

@@ -156,6 +156,9 @@ TYPED_TEST(Products, RefuseNegativeSizes) {
     EXPECT_EQ(this->err_, kEmptyInput);
     EXPECT_TRUE(this->vector_out_.empty());
     EXPECT_EQ(this->VecMat(x.handle(), negative.handle(), this->vector_out_.handle()), kEmptyInput);
+    HostArray<T> negative_vector(2);
+    negative_vector.SetDimension(0, -2);  // a fault of the size before one of the length
+    EXPECT_EQ(this->VecMat(negative_vector.handle(), two.handle(), this->vector_out_.handle()), kEmptyInput);
     EXPECT_EQ(this->Kronecker(negative.handle(), two.handle(), this->out_.handle()), kEmptyInput);
 
     const T* none = nullptr;
