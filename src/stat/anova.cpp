@@ -22,8 +22,9 @@ double Magnitude(int32_t levels) {
     return std::fabs(static_cast<double>(levels));
 }
 
-// Sums of the observations of a design by cell, and by every margin of it: the sums over all factors but some. A margin
-// is the set of the factors that are kept, factor k as bit k; the cells are the margin of all.
+// Sums of the observations of a design over all factors but some. Such a margin is the set of the factors that are kept,
+// factor k as bit k; the cells are the margin of all factors, the total that of none. Every sum follows the order of the
+// data.
 class Design {
   public:
     static constexpr int kMostFactors = 3;
@@ -31,73 +32,57 @@ class Design {
     // n observations are expected to be the product of the levels and r.
     int32_t Read(const double* y, const int32_t* const* levels, int32_t n, int32_t r, const int32_t* counts,
                  int factors) {
-        factors_ = factors;
         n_ = n;
-        cells_ = 1;
-        for (int k = 0; k < factors; ++k) {
-            levels_[k] = static_cast<int32_t>(Magnitude(counts[k]));
-            cells_ *= levels_[k];
+        cells_ = (1U << factors) - 1;
+        for (int k = 0; k < factors; ++k) levels_[k] = static_cast<int32_t>(Magnitude(counts[k]));
+        for (unsigned margin = 0; margin <= cells_; ++margin) {
+            sizes_[margin] = 1;
+            for (int k = 0; k < factors; ++k)
+                if (Keeps(margin, k)) sizes_[margin] *= levels_[k];
+            if (!sums_[margin].Allocate(Count(sizes_[margin]), Scratch<double>::kZeroed)) return kOutOfMemory;
         }
-        if (!sums_.Allocate(Count(cells_), Scratch<double>::kZeroed) ||
-            !observed_.Allocate(Count(cells_), Scratch<int32_t>::kZeroed))
-            return kOutOfMemory;
+        Scratch<int32_t> observed(Count(cells()), Scratch<int32_t>::kZeroed);
+        if (!observed) return kOutOfMemory;
         for (int32_t i = 0; i < n; ++i) {
-            int32_t cell = 0;
+            int32_t place[kMargins] = {};
             for (int k = 0; k < factors; ++k) {
                 const int32_t level = levels[k][i];
                 if (level < 0 || level >= levels_[k]) return kBadLevel;
-                cell = cell * levels_[k] + level;
+                for (unsigned margin = 0; margin <= cells_; ++margin)
+                    if (Keeps(margin, k)) place[margin] = place[margin] * levels_[k] + level;
             }
-            total_ += y[i];
             squares_ += y[i] * y[i];
-            sums_[Count(cell)] += y[i];
-            ++observed_[Count(cell)];
+            for (unsigned margin = 0; margin <= cells_; ++margin) sums_[margin][Count(place[margin])] += y[i];
+            ++observed[Count(place[cells_])];
         }
-        for (int32_t cell = 0; cell < cells_; ++cell)
-            if (observed_[Count(cell)] != r) return kUnbalanced;
+        for (int32_t cell = 0; cell < cells(); ++cell)
+            if (observed[Count(cell)] != r) return kUnbalanced;
         return kOk;
     }
 
     double squares() const { return squares_; }
-    double correction() const { return total_ * total_ / n_; }
+    double correction() const { return SumOfSquares(0); }
     int32_t levels(int factor) const { return levels_[factor]; }
-    int32_t cells() const { return cells_; }
+    int32_t cells() const { return sizes_[cells_]; }
 
     // Sum of the squares of a margin's sums over the number of observations behind each.
-    int32_t SumOfSquares(unsigned margin, double* sum) const {
-        Scratch<double> sums(Count(cells_), Scratch<double>::kZeroed);
-        if (!sums) return kOutOfMemory;
-        int32_t kept = 1;
-        for (int32_t cell = 0; cell < cells_; ++cell) sums[Count(Place(cell, margin, &kept))] += sums_[Count(cell)];
+    double SumOfSquares(unsigned margin) const {
         double squares = 0.0;
-        for (int32_t i = 0; i < kept; ++i) squares += sums[Count(i)] * sums[Count(i)];
-        *sum = squares / (n_ / kept);
-        return kOk;
+        for (size_t i = 0; i < Count(sizes_[margin]); ++i) squares += sums_[margin][i] * sums_[margin][i];
+        return squares / (n_ / sizes_[margin]);
     }
 
   private:
-    // Where the cell's sum goes in the margin, and the size of the margin.
-    int32_t Place(int32_t cell, unsigned margin, int32_t* size) const {
-        int32_t place = 0;
-        *size = 1;
-        for (int k = factors_ - 1; k >= 0; --k) {
-            const int32_t level = cell % levels_[k];
-            cell /= levels_[k];
-            if ((margin >> k & 1) == 0) continue;
-            place += level * *size;
-            *size *= levels_[k];
-        }
-        return place;
-    }
+    static constexpr unsigned kMargins = 1U << kMostFactors;
 
-    int factors_ = 0;
+    static bool Keeps(unsigned margin, int factor) { return (margin >> factor & 1) != 0; }
+
     int32_t n_ = 0;
-    int32_t cells_ = 0;
+    unsigned cells_ = 0;
     int32_t levels_[kMostFactors] = {};
-    double total_ = 0.0;
+    int32_t sizes_[kMargins] = {};
     double squares_ = 0.0;
-    Scratch<double> sums_;
-    Scratch<int32_t> observed_;
+    Scratch<double> sums_[kMargins];
 };
 
 AnovaRow Row(double sum_of_squares, double degrees_of_freedom) {
@@ -151,17 +136,11 @@ int32_t AnalyseTwoWays(const double* y, const int32_t* const levels[2], int32_t 
 
     constexpr unsigned kA = 1;
     constexpr unsigned kB = 2;
-    double margin_a;
-    double margin_b;
-    double cells;
-    if (design.SumOfSquares(kA, &margin_a) || design.SumOfSquares(kB, &margin_b) ||
-        design.SumOfSquares(kA | kB, &cells))
-        return kOutOfMemory;
     const double correction = design.correction();
     const double ss_total = design.squares() - correction;
-    const double ss_cells = cells - correction;
-    const double ss_a = margin_a - correction;
-    const double ss_b = margin_b - correction;
+    const double ss_cells = design.SumOfSquares(kA | kB) - correction;
+    const double ss_a = design.SumOfSquares(kA) - correction;
+    const double ss_b = design.SumOfSquares(kB) - correction;
     const double df_a = design.levels(0) - 1;
     const double df_b = design.levels(1) - 1;
     AnovaRow& a = table[0] = Row(ss_a, df_a);
@@ -196,8 +175,7 @@ int32_t AnalyseThreeWays(const double* y, const int32_t* const levels[3], int32_
     enum Effect { kA, kB, kC, kAB, kAC, kBC, kABC, kError, kNone };
     constexpr unsigned kMargins[7] = {1, 2, 4, 3, 5, 6, 7};
     double m[7];
-    for (int effect = kA; effect <= kABC; ++effect)
-        if (design.SumOfSquares(kMargins[effect], &m[effect])) return kOutOfMemory;
+    for (int effect = kA; effect <= kABC; ++effect) m[effect] = design.SumOfSquares(kMargins[effect]);
 
     const double t = design.correction();
     const double df_a = design.levels(0) - 1;

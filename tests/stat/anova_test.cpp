@@ -224,6 +224,15 @@ TEST(BalancedAnova, AgreesWithR) {
     EXPECT_EQ(designs, 70);
 }
 
+TEST(BalancedAnova, SumsTheLevelsInTheOrderOfTheData) {
+    Design design = Balanced({2, 2}, 2);
+    design.y = {1e16, 1.0, -1e16, 1.0, 0.0, 0.0, 0.0, 0.0};  // 1 altogether, of which the first 1 is lost
+    design.levels = {{0, 0, 0, 0, 1, 1, 1, 1}, {0, 1, 0, 1, 0, 1, 0, 1}};
+    ASSERT_EQ(design.Call(), 0);
+    EXPECT_EQ(design.table(0, 0), 1.0 / 4 - 1.0 / 8);
+    EXPECT_EQ(design.table(1, 0), 4.0 / 4 - 1.0 / 8);
+}
+
 TEST(BalancedAnova, WithoutReplicationsHasNoInteraction) {
     Design design = Balanced({2, 3}, 1);
     ASSERT_EQ(design.Call(), 0);
