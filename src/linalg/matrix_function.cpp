@@ -45,10 +45,9 @@ void SetIdentity(T* a, int32_t n) {
     AddToDiagonal(a, n, 1.0);
 }
 
-// C = A B for matrices of order n, at least 1.
 template <class T>
-void Multiply(const T* a, const T* b, int32_t n, T* c) {
-    MatMulCore(a, b, n, n, n, c);
+int32_t Multiply(const T* a, const T* b, int32_t n, T* c) {
+    return MatMulCore(a, b, n, n, n, c);
 }
 
 // log(M) = V log(D) V^-1 for M = V D V^-1. `out` may be M.
@@ -68,8 +67,7 @@ int32_t EigenLogarithm(const Complex* m, int32_t n, Complex* out) {
     }
     for (std::size_t i = 0; i < order; ++i)
         for (std::size_t j = 0; j < order; ++j) v[i * order + j] = v[i * order + j] * values[j];
-    Multiply(v, inverse, n, out);
-    return kOk;
+    return Multiply(v, inverse, n, out);
 }
 
 double LargestModulus(const Complex* a, std::size_t count) {
@@ -104,7 +102,7 @@ int32_t CorrectLogarithm(const Complex* a, int32_t n, Complex* logarithm, bool* 
     std::copy_n(e, count, inverse);
     if (const int32_t status = InvertByLU(inverse, n)) return status;
     for (std::size_t i = 0; i < count; ++i) e[i] -= a[i];
-    Multiply(e, inverse, n, g);
+    if (const int32_t status = Multiply(e, inverse, n, g)) return status;
     *finite = !HasUnusable(g, count);
     if (!*finite) return kOk;
     *converged = true;
@@ -113,33 +111,6 @@ int32_t CorrectLogarithm(const Complex* a, int32_t n, Complex* logarithm, bool* 
         if (!(logarithm[i].re * 1e-12 >= g[i].re && logarithm[i].im * 1e-12 >= g[i].im)) *converged = false;
     }
     return kOk;
-}
-
-// How many powers of a matrix its polynomials are made of: one less would take more products, one more more memory.
-constexpr std::size_t kPowers = 3;
-
-// The polynomial c[0] + c[2] Y + c[4] Y^2 + ... of a degree in Y, whose first powers are given one after the other, by
-// Horner's rule in the last of them (M. S. Paterson and L. J. Stockmeyer, SIAM J. Comput. 2, 60, 1973). The two matrices
-// change places.
-template <class T>
-void EvaluatePolynomial(const double* c, std::size_t degree, const T* powers, int32_t n, T** sum, T** other) {
-    const std::size_t count = Count(n) * Count(n);
-    std::fill_n(*sum, count, T{});
-    std::size_t end = degree + 1;  // of the terms that are left
-    std::size_t first = degree == 0 ? 0 : (degree - 1) / kPowers * kPowers;
-    for (;;) {
-        for (std::size_t k = end - first - 1; k > 0; --k) {
-            const double factor = c[2 * (first + k)];
-            const T* const power = powers + (k - 1) * count;
-            for (std::size_t i = 0; i < count; ++i) (*sum)[i] += factor * power[i];
-        }
-        AddToDiagonal(*sum, n, c[2 * first]);
-        if (first == 0) return;
-        Multiply(*sum, powers + (kPowers - 1) * count, n, *other);
-        std::swap(*sum, *other);
-        end = first;
-        first -= kPowers;
-    }
 }
 
 Complex PrincipalRoot(Complex z) {
@@ -186,6 +157,14 @@ template <class T>
 int32_t ExpCore(T* a, int32_t n) {
     if (n < 1) return kEmptyInput;
     const std::size_t count = Count(n) * Count(n);
+    Scratch<T> work(4 * count);
+    Scratch<int32_t> pivots(Count(n));
+    if (!work || !pivots) return kOutOfMemory;
+    T* const x = work.data();
+    T* const d = x + count;
+    T* p = d + count;
+    T* t = p + count;
+
     const double norm = InfinityNorm(a, n);
     if (!std::isfinite(norm)) {
         // No power of two brings the matrix into the range of the approximant.
@@ -195,51 +174,37 @@ int32_t ExpCore(T* a, int32_t n) {
     const int32_t squarings = norm >= 0.5 ? static_cast<int32_t>(std::log(norm) / std::log(2.0) + 1.0) : 0;
     const double factor = std::ldexp(1.0, squarings);
     const int32_t order = PadeOrder(1e-8, norm);
-    Scratch<T> work((kPowers + 2) * count);
-    Scratch<double> c(Count(order) + 1);
-    Scratch<int32_t> pivots(Count(n));
-    if (!work || !c || !pivots) return kOutOfMemory;
-    c[0] = 1.0;
-    c[1] = 0.5;
-    for (int32_t k = 2; k <= order; ++k)
-        c[Count(k)] = c[Count(k) - 1] * (order - k + 1.0) / ((2.0 * order - k + 1.0) * k);
-
-    // The numerator is V + U and the denominator V - U, V being the even terms and U the odd ones: polynomials in
-    // Y = X^2, and X times such a one.
-    T* const powers = work.data();
-    T* x = a;
-    T* odd = powers + kPowers * count;
-    T* other = odd + count;
-    for (std::size_t i = 0; i < count; ++i) x[i] = x[i] / factor;
-    Multiply(x, x, n, powers);
-    for (std::size_t k = 1; k < std::min(kPowers, Count(order) / 2); ++k)
-        Multiply(powers + (k - 1) * count, powers, n, powers + k * count);
-    EvaluatePolynomial(c.data() + 1, Count(order - 1) / 2, powers, n, &odd, &other);
-    Multiply(odd, x, n, other);
-    std::swap(odd, other);
-    T* even = x;
-    EvaluatePolynomial(c.data(), Count(order) / 2, powers, n, &even, &other);
-
-    T* const numerator = powers;
-    T* const denominator = numerator + count;
-    T* const inverse = denominator + count;
     for (std::size_t i = 0; i < count; ++i) {
-        numerator[i] = even[i] + odd[i];
-        denominator[i] = even[i] - odd[i];
+        x[i] = a[i] / factor;
+        a[i] = x[i] / 2.0;
+        d[i] = x[i] / -2.0;
     }
-    int32_t parity;
-    LUFactor(denominator, n, pivots.data(), &parity);  // what is singular shows in the result
-    if (const int32_t status = LUInverse(denominator, pivots.data(), n, inverse)) return status;
+    AddToDiagonal(a, n, 1.0);
+    AddToDiagonal(d, n, 1.0);
+    if (const int32_t status = Multiply(x, x, n, p)) return status;
+    double c = 0.5;
+    double sign = 1.0;
+    for (int32_t k = 2; k <= order; ++k) {
+        c = c * (order - k + 1.0) / ((2.0 * order - k + 1.0) * k);
+        for (std::size_t i = 0; i < count; ++i) {
+            a[i] += c * p[i];
+            d[i] += sign * c * p[i];
+        }
+        if (k == order) break;
+        if (const int32_t status = Multiply(p, x, n, t)) return status;
+        std::swap(p, t);
+        sign = -sign;
+    }
 
-    // The squarings end in `a`.
-    T* result = a;
-    T* spare = odd;
-    if (squarings % 2 != 0) std::swap(result, spare);
-    Multiply(inverse, numerator, n, result);
+    int32_t parity;
+    LUFactor(d, n, pivots.data(), &parity);  // what is singular shows in the result
+    if (const int32_t status = LUInverse(d, pivots.data(), n, d)) return status;
+    if (const int32_t status = Multiply(d, a, n, t)) return status;
     for (int32_t s = 0; s < squarings; ++s) {
-        Multiply(result, result, n, spare);
-        std::swap(result, spare);
+        if (const int32_t status = Multiply(t, t, n, p)) return status;
+        std::swap(p, t);
     }
+    std::copy_n(t, count, a);
     return kOk;
 }
 
@@ -284,7 +249,7 @@ int32_t CxSqrtCore(Complex* a, int32_t n) {
     if (const int32_t status = SchurCore(a, n, kModulusDescending, u, t, values)) return status;
     const bool doubtful = n != 1 && SumOfParts(values[n - 2]) < 1e-12;
     TriangularRoot(t, n, s);
-    Multiply(u, s, n, t);
+    if (const int32_t status = Multiply(u, s, n, t)) return status;
     lapack::Gemm(lapack::kRowMajor, lapack::kNoTranspose, lapack::kConjugateTranspose, n, n, n, Complex{1.0, 0.0}, t, n,
                  u, n, Complex{}, a, n);
     return doubtful ? kWarnInaccurate : kOk;
@@ -314,10 +279,10 @@ int32_t PowerCore(const T* a, int32_t n, int32_t power, T* out) {
         SetIdentity(r, n);
     }
     while ((bits >>= 1) != 0) {
-        Multiply(x, x, n, spare);
+        if (const int32_t status = Multiply(x, x, n, spare)) return status;
         std::swap(x, spare);
         if ((bits & 1) == 0) continue;
-        Multiply(x, r, n, spare);
+        if (const int32_t status = Multiply(x, r, n, spare)) return status;
         std::swap(r, spare);
     }
     std::copy_n(r, count, out);
