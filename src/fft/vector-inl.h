@@ -37,10 +37,16 @@ using Tag = hn::FixedTag<double, N>;
 template <size_t N>
 using Mask = hn::Mask<Tag<N>>;
 
+// The default constructors are written out because an implied one would not be compiled for this instruction set, and
+// compilers refuse to inline vectors there.
+
 // N real columns.
 template <size_t N>
 struct RealColumns {
     hn::Vec<Tag<N>> v;
+
+    KRNUMER_FFT_INLINE RealColumns() {}
+    KRNUMER_FFT_INLINE RealColumns(hn::Vec<Tag<N>> columns) : v(columns) {}
 
     friend KRNUMER_FFT_INLINE RealColumns operator+(RealColumns a, RealColumns b) { return {hn::Add(a.v, b.v)}; }
     friend KRNUMER_FFT_INLINE RealColumns operator-(RealColumns a, RealColumns b) { return {hn::Sub(a.v, b.v)}; }
@@ -55,6 +61,9 @@ struct RealColumns {
 template <size_t N>
 struct ComplexColumns {
     hn::Vec<Tag<N>> v;
+
+    KRNUMER_FFT_INLINE ComplexColumns() {}
+    KRNUMER_FFT_INLINE ComplexColumns(hn::Vec<Tag<N>> columns) : v(columns) {}
 
     friend KRNUMER_FFT_INLINE ComplexColumns operator+(ComplexColumns a, ComplexColumns b) {
         return {hn::Add(a.v, b.v)};
@@ -71,6 +80,9 @@ struct ComplexColumns {
 template <size_t N>
 struct SplitColumns {
     RealColumns<N> re, im;
+
+    KRNUMER_FFT_INLINE SplitColumns() {}
+    KRNUMER_FFT_INLINE SplitColumns(RealColumns<N> real, RealColumns<N> imaginary) : re(real), im(imaginary) {}
 
     friend KRNUMER_FFT_INLINE SplitColumns operator+(SplitColumns a, SplitColumns b) {
         return {a.re + b.re, a.im + b.im};

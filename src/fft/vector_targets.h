@@ -2,4 +2,5 @@
 // SSSE3 on, four from AVX2, eight from AVX-512. To be included before Highway.
 #pragma once
 
-#define HWY_DISABLED_TARGETS (HWY_SSE4 | HWY_AVX3_DL | HWY_SVE | HWY_SVE2 | HWY_SVE_256 | HWY_SVE2_128 | HWY_RVV)
+#define HWY_DISABLED_TARGETS (HWY_SSE4 | HWY_AVX3_DL | KRNUMER_SIZELESS_TARGETS)
+#include "frame/vector_targets.h"

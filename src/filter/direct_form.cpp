@@ -7,6 +7,7 @@
 
 #include "filter/stream.h"
 #include "frame/status.h"
+#include "frame/vector_targets.h"
 
 #undef HWY_TARGET_INCLUDE
 #define HWY_TARGET_INCLUDE "filter/direct_form.cpp"

@@ -3,6 +3,7 @@
 #include <cmath>
 
 #include "frame/status.h"
+#include "frame/vector_targets.h"
 #include "gen/phase.h"
 #include "gen/wave.h"
 

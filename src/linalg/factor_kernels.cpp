@@ -2,10 +2,9 @@
 // the columns of a tile fill vectors.
 #include "linalg/factor_kernels.h"
 
+#include "frame/vector_targets.h"
 #include "linalg/element.h"
 
-// Tiles are arrays of vectors, which takes vectors of a size that is known now.
-#define HWY_DISABLED_TARGETS (HWY_SVE | HWY_SVE_256 | HWY_SVE2 | HWY_SVE2_128 | HWY_RVV)
 #undef HWY_TARGET_INCLUDE
 #define HWY_TARGET_INCLUDE "linalg/factor_kernels.cpp"
 #include <hwy/foreach_target.h>

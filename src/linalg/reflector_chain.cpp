@@ -2,8 +2,8 @@
 // same.
 #include "linalg/reflector_chain.h"
 
-// Strips are arrays of vectors, which takes vectors of a size that is known now.
-#define HWY_DISABLED_TARGETS (HWY_SVE | HWY_SVE_256 | HWY_SVE2 | HWY_SVE2_128 | HWY_RVV)
+#include "frame/vector_targets.h"
+
 #undef HWY_TARGET_INCLUDE
 #define HWY_TARGET_INCLUDE "linalg/reflector_chain.cpp"
 #include <hwy/foreach_target.h>

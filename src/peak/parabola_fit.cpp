@@ -5,6 +5,7 @@
 #include <cmath>
 
 #include "frame/numeric.h"
+#include "frame/vector_targets.h"
 #include "linalg/svd_solve.h"
 
 #undef HWY_TARGET_INCLUDE

@@ -6,6 +6,7 @@
 #include <type_traits>
 
 #include "frame/numeric.h"
+#include "frame/vector_targets.h"
 
 #undef HWY_TARGET_INCLUDE
 #define HWY_TARGET_INCLUDE "sigop/direct_convolution.cpp"

@@ -6,6 +6,8 @@
 #include <algorithm>
 #include <type_traits>
 
+#include "frame/vector_targets.h"
+
 #undef HWY_TARGET_INCLUDE
 #define HWY_TARGET_INCLUDE "sigop/resample_group.cpp"
 #include <hwy/foreach_target.h>
@@ -37,7 +39,7 @@ struct Rows {
 // The doubles at every address and those behind them.
 template <class D>
 HWY_INLINE void LoadPairs(D tag, const double* const* at, hn::Vec<D>& first, hn::Vec<D>& second) {
-#if HWY_HAVE_SCALABLE || HWY_TARGET == HWY_SCALAR
+#if HWY_TARGET == HWY_SCALAR
     alignas(64) double pairs[2][kGroup];
     for (size_t k = 0; k < hn::Lanes(tag); ++k)
         for (size_t i = 0; i < 2; ++i) pairs[i][k] = at[k][i];
