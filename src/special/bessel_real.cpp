@@ -30,8 +30,18 @@ double JvSeries(double v, double x) {
     return sum * std::pow(0.5 * x, v) / Gamma(v + 1.0);
 }
 
-// Hankel's series in pairs of terms, up to the smallest.
-double JvHankel(double v, double x) {
+// Hankel's series for x far from 0, the same for v and -v.
+struct HankelSums {
+    double p, q;
+
+    double J(double v, double x) const {
+        const double phase = x - (0.5 * v + 0.25) * kPi;
+        return std::sqrt(2.0 / (x * kPi)) * (p * std::cos(phase) - q * std::sin(phase));
+    }
+};
+
+// In pairs of terms, up to the smallest.
+HankelSums SumHankel(double v, double x) {
     const double m = 4.0 * v * v, z = 8.0 * x;
     double j = 1.0, k = 1.0, sign = 1.0;
     double term = (m - 1.0) / z, p = 1.0, q = term;
@@ -56,8 +66,11 @@ double JvHankel(double v, double x) {
         }
         if (fallen && change > smallest) break;
     }
-    const double phase = x - (0.5 * v + 0.25) * kPi;
-    return std::sqrt(2.0 / (x * kPi)) * (best_p * std::cos(phase) - best_q * std::sin(phase));
+    return {best_p, best_q};
+}
+
+double JvHankel(double v, double x) {
+    return SumHankel(v, x).J(v, x);
 }
 
 struct Recurrence {
@@ -83,36 +96,56 @@ Recurrence JvRecur(double n, double x, double k) {
     return {n, order, value};
 }
 
-// J_k where the power series or Hankel's series is good, |k| below about 20 or not far above 3.6 sqrt(x).
-double ByEitherSeries(double k, double x) {
-    const double size = std::abs(k);
+enum class Method { kSeries, kHankel, kRecurrence, kUniform };
+
+// Which of the two series is good for an order below about 20 or not far above 3.6 sqrt(x).
+Method SeriesFor(double size, double x) {
     const double meeting = size >= 26.0 ? 0.9 * size : (0.0083 * size + 0.09) * size + 12.9;
-    return x <= meeting ? JvSeries(k, x) : JvHankel(k, x);
+    return x <= meeting ? Method::kSeries : Method::kHankel;
+}
+
+double BySeries(Method method, double v, double x) {
+    return method == Method::kSeries ? JvSeries(v, x) : JvHankel(v, x);
+}
+
+// The order to which the recurrence leads, apart from the fraction.
+double Reach(double x) {
+    const double reach = 3.6 * std::sqrt(x);
+    return reach <= 17.0 ? 2.0 : reach;
 }
 
 double ByRecurrence(double v, double x) {
-    double reach = 3.6 * std::sqrt(x);
-    if (reach <= 17.0) reach = 2.0;
-    if (std::abs(v) <= reach + 3.0) return ByEitherSeries(v, x);
-    const double fraction = v - std::floor(v);
-    if (v > 0.0) {
-        const Recurrence down = JvRecur(v, x, std::floor(reach) + fraction);
-        return down.ratio == 0.0 ? 0.0 : ByEitherSeries(down.to, x) / down.ratio;
+    const double reach = Reach(x), fraction = v - std::floor(v);
+    const bool is_positive = v > 0.0;
+    const Recurrence down =
+        is_positive ? JvRecur(v, x, std::floor(reach) + fraction) : JvRecur(std::floor(-reach) + fraction, x, v);
+    if (down.ratio == 0.0) return 0.0;
+    const double known = is_positive ? down.to : down.from;
+    const double j = BySeries(SeriesFor(std::abs(known), x), known, x);
+    return is_positive ? j / down.ratio : down.ratio * j;
+}
+
+// For order v and -v, size = |v|.
+Method MethodFor(double size, double x) {
+    if (size > 17.0) {
+        if (x < 3.6 * std::sqrt(size)) return Method::kSeries;
+        if (size < 3.6 * std::sqrt(x)) return Method::kHankel;
     }
-    const Recurrence down = JvRecur(std::floor(-reach) + fraction, x, v);
-    return down.ratio == 0.0 ? 0.0 : down.ratio * ByEitherSeries(down.from, x);
+    if (size < kUniformFrom) return size <= Reach(x) + 3.0 ? SeriesFor(size, x) : Method::kRecurrence;
+    return x / size / size > 0.3 ? Method::kHankel : Method::kUniform;
 }
 
 // For x >= 0.
 double JOfRealOrder(double v, double x) {
     if (x < kEpsilon) return DomainError(0.0);
-    const double size = std::abs(v), reach = 3.6 * std::sqrt(x);
-    if (size > 17.0) {
-        if (x < 3.6 * std::sqrt(size)) return JvSeries(v, x);
-        if (size < reach) return JvHankel(v, x);
+    switch (const Method method = MethodFor(std::abs(v), x)) {
+        case Method::kRecurrence:
+            return ByRecurrence(v, x);
+        case Method::kUniform:
+            return BesselJUniform(v, x);
+        default:
+            return BySeries(method, v, x);
     }
-    if (size < kUniformFrom) return ByRecurrence(v, x);
-    return x / v / v > 0.3 ? JvHankel(v, x) : BesselJUniform(v, x);
 }
 
 }  // namespace
@@ -139,9 +172,22 @@ double BesselY(double v, double x) {
     }
     if (v < kLeastOrder) return DomainError(kQuietNaN);
     if (v - std::floor(v) < 1e-8) DomainError(v);  // digits are lost below
-    const double j = BesselJ(v, x), reflected = BesselJ(-v, x);
+    const double cosine = std::cos(kPi * v), sine = std::sin(kPi * v);
+    double j, reflected;
+    if (v < kUniformFrom && x >= kEpsilon && MethodFor(std::abs(v), x) == Method::kHankel) {
+        const HankelSums sums = SumHankel(v, x);
+        j = sums.J(v, x);
+        reflected = sums.J(-v, x);
+    } else {
+        reflected = BesselJ(-v, x);
+        constexpr double kOutweighs = 0x1p55;  // J_v, which is at most 1 for v > 0, by a digit more than a double has
+        if (v > 0.0 && std::abs(reflected) > kOutweighs * std::abs(cosine) && std::isfinite(reflected)) {
+            return -reflected / sine;
+        }
+        j = BesselJ(v, x);
+    }
     if (!std::isfinite(j) || !std::isfinite(reflected)) return kQuietNaN;
-    return (std::cos(kPi * v) * j - reflected) / std::sin(kPi * v);
+    return (cosine * j - reflected) / sine;
 }
 
 double SphericalBesselJ(int32_t n, double x) {
