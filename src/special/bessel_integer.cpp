@@ -3,7 +3,9 @@
 // recurrence relations, 1967).
 #include "special/bessel_integer.h"
 
+#include <algorithm>
 #include <cmath>
+#include <cstdint>
 
 #include "frame/numeric.h"
 #include "special/bessel_coefficients.h"
@@ -62,8 +64,22 @@ Orders LargeY(double x) {
     return {zero.p * sine + zero.wq * cosine, one.wq * sine - one.p * cosine};
 }
 
+// True where 2 k / x times one of the two orders is lost beside the other for every k up to n, so that the recurrence
+// only turns signs.
+bool OnlyTurns(const Orders& start, double n, double x) {
+    constexpr double kLost = 0x1p-55;
+    if (!(n < kLost * x)) return false;
+    const double zero = std::abs(start.zero), one = std::abs(start.one);
+    return 2.0 * n / x * std::max(zero, one) < kLost * std::min(zero, one);
+}
+
 // Upward. Stable for J where x > n, and for Y.
 double Upward(const Orders& start, double n, double x) {
+    if (OnlyTurns(start, n, x)) {
+        const auto order = static_cast<int64_t>(n);
+        const double value = order & 1 ? start.one : start.zero;
+        return order & 2 ? -value : value;
+    }
     double before = start.zero, value = start.one;
     for (double k = 1.0; k < n; k += 1.0) {
         const double next = 2.0 * k / x * value - before;
@@ -148,6 +164,8 @@ double BesselJn(double n, double x) {
 double BesselYn(double n, double x) {
     if (n == 0.0) return BesselY0(x);
     if (n == 1.0) return BesselY1(x);
+    constexpr double kMany = 1000.0;  // steps, which take longer than the bound
+    if (n > kMany && x < n && LnBound(n, x / n) < kLnSmallest) return -kInfinity;  // |J_n Y_n| is at least 1 / (pi n)
     return Upward(x > 5.0 ? LargeY(x) : Orders{BesselY0(x), BesselY1(x)}, n, x);
 }
 

@@ -80,6 +80,17 @@ TEST(BesselJ, FollowsTheParityOfIntegers) {
 }
 
 // 1 / r(n) + r(n + 1) = 2 n / x for r(n) = J_n / J_(n - 1).
+// Beyond x = 2^55 n no order differs from the second before it but by its sign.
+TEST(BesselJ, OnlyTurnsItsSignFarOut) {
+    for (const double x : {1e30, 3.7e100, 1e308}) {
+        EXPECT_EQ(J(2147483646.0, x), -J(0.0, x)) << x;
+        EXPECT_EQ(J(2147483647.0, x), J(3.0, x)) << x;
+        EXPECT_EQ(J(2147483644.0, x), J(4.0, x)) << x;
+        EXPECT_EQ(Y(2147483645.0, x), Y(5.0, x)) << x;
+        EXPECT_EQ(Y(2147483647.0, x), Y(3.0, x)) << x;
+    }
+}
+
 TEST(BesselRatio, ObeysTheRecurrenceUpToTheLargestOrders) {
     for (const double n : {2.0, 16.5, 1000.0, 1e6, 1e9, 2147483646.0}) {
         for (const double z : {1e-3, 0.5, 0.999, 1.0}) {
@@ -140,6 +151,7 @@ TEST(BesselY, IsNegativeInfinityOnceItOverflows) {
     EXPECT_EQ(Y(-200.0, 1.0), -kInfinity);
     EXPECT_EQ(Y(-201.0, 1.0), kInfinity);
     EXPECT_EQ(Y(2147483647.0, 1.0), -kInfinity);
+    EXPECT_EQ(Y(2147483647.0, 2.1e9), -kInfinity);
     EXPECT_EQ(Y(-2147483648.0, 1.0), -kInfinity);
     EXPECT_EQ(Y(5.0, 1e-300), -kInfinity);
 }
