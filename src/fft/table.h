@@ -69,6 +69,7 @@ struct VectorPlan {
     int32_t length;     // of each
     int32_t together;   // how many are transformed at a time
     bool tiled;         // whether the stages are run in tiles
+    bool far;           // whether so because the data come from memory
     ptrdiff_t* places;  // where the results of the sub-sequences begin, in the order of their first samples
 };
 

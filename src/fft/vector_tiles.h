@@ -15,9 +15,18 @@ namespace krnumer {
 template <class T>
 int32_t CountTiledFactors(const qmfft_table* table);
 
+// Whether elements T of the table's length come from memory rather than from the caches.
+template <class T>
+bool AreFar(const qmfft_table* table);
+
 // How many neighbouring sub-sequences of `length` elements are transformed together before: as many as the cache holds.
+inline constexpr int32_t kMostLanes = 64;
 template <class T>
 int32_t LanesBeforeTiles(int32_t length);
+
+// The doubles that such sub-sequences, or a tile, take; both lie on the stack. So does what is lost between their rows.
+inline constexpr int32_t kTileDoubles = 32 * 1024;
+inline constexpr int32_t kPaddingDoubles = 2 * 1024;
 
 // Runs these stages in place. The sub-sequences of all other factors are done.
 template <class T>

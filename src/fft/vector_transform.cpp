@@ -5,6 +5,8 @@
 #include <type_traits>
 
 #include "fft/factor.h"
+#include "fft/inline.h"
+#include "fft/vector_rows.h"
 #include "fft/vector_tiles.h"
 #include "fft/vector_twiddles.h"
 #include "frame/complex.h"
@@ -72,11 +74,118 @@ int32_t TransformLanes(const qmfft_table* table, int32_t i, int32_t n, const T* 
     return kOk;
 }
 
+// ---- Sub-sequences of data from memory ----
+//
+// Their samples are fetched while others are transformed, and little at a time, or the processor waits for them.
+
+// Where the samples of leaf q of a sub-sequence are.
+template <class T>
+const T* LeafSamples(const qmfft_table* table, const VectorPlan& plan, const T* in, int32_t q) {
+    const int32_t last = table->factorCount - 1;
+    ptrdiff_t step = table->length / table->factors[last];
+    for (int32_t i = last; i-- > plan.depth; q /= table->factors[i]) {
+        step /= table->factors[i];
+        in += q % table->factors[i] * step;
+    }
+    return in;
+}
+
+// Fetches a line of samples that are `step` apart.
+template <class T>
+KRNUMER_FFT_INLINE void FetchSamples(const T* in, ptrdiff_t step, int32_t count) {
+    for (int32_t j = 0; j < count; ++j) FetchLine(in + j * step);
+}
+
+// The leaves of `lanes` neighbouring sub-sequences. Those of the `following` next ones come after them.
+template <class T>
+void TransformFarLeaves(const qmfft_table* table, const VectorPlan& plan, const T* in, int32_t lanes, int32_t following,
+                        T* out, const ptrdiff_t* places) {
+    const int32_t last = table->factorCount - 1;
+    const int32_t r = table->factors[last];
+    const int32_t leaves = plan.length / r;
+    const ptrdiff_t step = table->length / r;
+    for (int32_t q = 0; q < leaves; ++q) {
+        const bool ends = q == leaves - 1;
+        const T* x = LeafSamples(table, plan, in, q);
+        const T* next = ends ? in + lanes : LeafSamples(table, plan, in, q + 1);
+        const int32_t fetched = ends ? following : lanes;
+        for (int32_t l = 0; l < lanes; l += kGroup<T>) {
+            if (l < fetched) FetchSamples(next + l, step, r);
+            RunColumns(table, last, x + l, step, out + ptrdiff_t{q} * r, places + l, std::min(kGroup<T>, lanes - l));
+        }
+    }
+}
+
+// The stages of a sub-sequence behind its leaves.
+template <class T>
+int32_t RunStagesOfLane(const qmfft_table* table, const VectorPlan& plan, T* lane) {
+    int32_t m = table->factors[table->factorCount - 1];
+    for (int32_t i = table->factorCount - 1; i-- > plan.depth; m *= table->factors[i])
+        for (int32_t start = 0; start < plan.length; start += m * table->factors[i])
+            if (const int32_t status = RunStage(table, i, lane + start, m)) return status;
+    return kOk;
+}
+
+// Calls run(start, lanes, following) for the sub-sequences that are transformed together; stops at a status.
+template <class Run>
+int32_t ForEachGroup(const VectorPlan& plan, const Run& run) {
+    for (int32_t start = 0; start < plan.sequences; start += plan.together) {
+        const int32_t lanes = std::min(plan.together, plan.sequences - start);
+        const int32_t following = std::min(plan.together, plan.sequences - start - lanes);
+        if (const int32_t status = run(start, lanes, following)) return status;
+    }
+    return kOk;
+}
+
+template <class T>
+int32_t TransformFarLanes(const qmfft_table* table, const VectorPlan& plan, const T* in, T* out) {
+    return ForEachGroup(plan, [&](int32_t start, int32_t lanes, int32_t following) {
+        const ptrdiff_t* places = plan.places + start;
+        TransformFarLeaves(table, plan, in + start, lanes, following, out, places);
+        for (int32_t l = 0; l < lanes; ++l)
+            if (const int32_t status = RunStagesOfLane(table, plan, out + places[l])) return status;
+        return kOk;
+    });
+}
+
+// The same with the results on the stack and from there straight to memory, without what it held before.
+KRNUMER_FFT_NOINLINE int32_t StreamFarLanes(const qmfft_table* table, const VectorPlan& plan, const Complex* in,
+                                            Complex* out) {
+    alignas(64) Complex results[(kTileDoubles + kPaddingDoubles) / 2];
+    ptrdiff_t places[kMostLanes];
+    for (int32_t l = 0; l < plan.together; ++l) places[l] = ptrdiff_t{l} * (plan.length + kGroup<Complex>);
+    const int32_t status = ForEachGroup(plan, [&](int32_t start, int32_t lanes, int32_t following) {
+        TransformFarLeaves(table, plan, in + start, lanes, following, results, places);
+        for (int32_t l = 0; l < lanes; ++l) {
+            Complex* const lane = results + places[l];
+            if (const int32_t failure = RunStagesOfLane(table, plan, lane)) return failure;
+            StreamRows(&lane->re, 0, &out[plan.places[start + l]].re, 0, 1, 2 * plan.length);
+        }
+        return kOk;
+    });
+    FlushStreams();
+    return status;
+}
+
+int32_t TransformFar(const qmfft_table* table, const VectorPlan& plan, const Complex* in, Complex* out) {
+    const bool whole_lines = IsLine(out) && plan.length % kGroup<Complex> == 0;
+    return whole_lines ? StreamFarLanes(table, plan, in, out) : TransformFarLanes(table, plan, in, out);
+}
+
+int32_t TransformFar(const qmfft_table* table, const VectorPlan& plan, const double* in, double* out) {
+    return TransformFarLanes(table, plan, in, out);
+}
+
 // The stages behind the plan's sub-sequences go through all data one after the other, or in tiles.
 template <class T>
 int32_t Transform(const qmfft_table* table, const VectorPlan& plan, const T* in, T* out) {
     if (plan.depth == 0) {
         RunColumns(table, 0, in, 1, out, plan.places, 1);
+        return kOk;
+    }
+    if (plan.far) {
+        if (const int32_t status = TransformFar(table, plan, in, out)) return status;
+        CombineInTiles(table, out);
         return kOk;
     }
     for (int32_t start = 0; start < plan.sequences; start += plan.together) {
@@ -119,6 +228,7 @@ bool MakePlan(const qmfft_table* table, VectorPlan* plan) {
     const bool cached = Count(table->length) * sizeof(T) <= kCachedBytes;
     const int32_t tiled = cached ? 0 : CountTiledFactors<T>(table);
     plan->tiled = tiled > 0;
+    plan->far = plan->tiled && AreFar<T>(table);
     plan->length = table->length;
     plan->sequences = 1;
     while (plan->depth < last && (tiled > 0 ? plan->depth < tiled : cached || plan->sequences < kGroup<T>)) {
