@@ -2,6 +2,7 @@
 // expansions about m = 0 and m = 1.
 #include "special/jacobi_elliptic.h"
 
+#include <algorithm>
 #include <cmath>
 #include <cstdint>
 
@@ -11,6 +12,7 @@ namespace krnumer {
 namespace {
 
 constexpr double kHalfPi = 1.5707963267948966;
+constexpr JacobiElliptic kNoValue = {kQuietNaN, kQuietNaN, kQuietNaN, kQuietNaN};
 
 JacobiElliptic NearCircular(double u, double m) {
     const double sine = std::sin(u), cosine = std::cos(u);
@@ -34,8 +36,9 @@ JacobiElliptic NearHyperbolic(double u, double m) {
 
 JacobiElliptic ByMean(double u, double m) {
     constexpr int32_t kMostLevels = 8;
+    constexpr double kLost = 0x1p-55;  // beside 1; so the last level mostly only halves the amplitude
     double a[kMostLevels + 1] = {1.0}, c[kMostLevels + 1] = {std::sqrt(m)};
-    double b = std::sqrt(1.0 - m);
+    double b = std::sqrt(1.0 - m), scale = 1.0;
     int32_t level = 0;
     while (std::abs(c[level] / a[level]) > kEpsilon) {
         if (level == kMostLevels) {
@@ -46,12 +49,16 @@ JacobiElliptic ByMean(double u, double m) {
         c[level] = (previous - b) / 2.0;
         a[level] = (previous + b) / 2.0;
         b = std::sqrt(previous * b);
+        scale *= 2.0;
     }
-    double phi = std::ldexp(a[level] * u, level);
+    double phi = a[level] * u * scale;
     double before = phi;
+    if (!std::isfinite(phi)) return kNoValue;
     for (; level > 0; --level) {
         before = phi;
-        phi = (std::asin(c[level] * std::sin(phi) / a[level]) + phi) / 2.0;
+        const bool is_lost = std::abs(c[level]) < kLost * a[level] * std::max(1.0, std::abs(phi));
+        if (!is_lost) phi += std::asin(c[level] * std::sin(phi) / a[level]);
+        phi /= 2.0;
     }
     const double sn = std::sin(phi), cn = std::cos(phi);
     const double divisor = std::cos(before - phi);
@@ -62,7 +69,7 @@ JacobiElliptic ByMean(double u, double m) {
 }  // namespace
 
 JacobiElliptic JacobiEllipticFunctions(double u, double m) {
-    if (!std::isfinite(u) || !std::isfinite(m)) return {kQuietNaN, kQuietNaN, kQuietNaN, kQuietNaN};
+    if (!std::isfinite(u) || !std::isfinite(m)) return kNoValue;
     if (m < 0.0 || m > 1.0) {
         const double zero = DomainError(0.0);
         return {zero, zero, zero, zero};
