@@ -4,6 +4,7 @@
 
 #include <cstddef>
 #include <cstdint>
+#include <utility>
 
 #include "frame/numeric.h"
 #include "frame/pair.h"
@@ -27,15 +28,12 @@ inline double PolyEvalMonic(double x, const double* table, int32_t degree) {
 }
 
 // Clenshaw's recurrence for twice the sum of coefficients times Chebyshev polynomials in x / 2, x in -2 to 2. The
-// constant term, the last, counts by half.
-template <class V, class Coefficient>
-V Clenshaw(V x, int32_t count, Coefficient coefficient) {
+// constant term, the last, counts by half. Every step waits for the one before; written out, without the counting of a
+// loop, they leave the processor more room for what does not wait.
+template <class V, class Coefficient, size_t... i>
+V Clenshaw(V x, Coefficient coefficient, std::index_sequence<i...>) {
     V sum = coefficient(0), before = {}, before_that = {};
-    for (int32_t i = 1; i < count; ++i) {
-        before_that = before;
-        before = sum;
-        sum = x * before - before_that + coefficient(i);
-    }
+    ((before_that = before, before = sum, sum = x * before - before_that + coefficient(i + 1)), ...);
     return sum - before_that;
 }
 
@@ -52,14 +50,15 @@ double PolyEvalMonic(double x, const double (&table)[n]) {
 
 template <size_t n>
 double ChebyshevSum(double x, const double (&table)[n]) {
-    return 0.5 * Clenshaw(x, static_cast<int32_t>(n), [&](int32_t i) { return table[i]; });
+    const auto coefficient = [&](size_t i) { return table[i]; };
+    return 0.5 * Clenshaw(x, coefficient, std::make_index_sequence<n - 1>());
 }
 
-// The sums of two tables side by side, in the time of one: every step of the recurrence waits for the one before.
+// The sums of two tables side by side, in the time of one.
 template <size_t n>
 Pair ChebyshevSums(double x, const double (&first)[n], const double (&second)[n]) {
-    const auto coefficients = [&](int32_t i) { return Pair{first[i], second[i]}; };
-    return Pair{0.5, 0.5} * Clenshaw(Pair{x, x}, static_cast<int32_t>(n), coefficients);
+    const auto coefficients = [&](size_t i) { return Pair{first[i], second[i]}; };
+    return Pair{0.5, 0.5} * Clenshaw(Pair{x, x}, coefficients, std::make_index_sequence<n - 1>());
 }
 
 }  // namespace krnumer
