@@ -23,11 +23,13 @@ int32_t Copy(const T* from, int32_t size, Polynomial<T>* to) {
     return kOk;
 }
 
-// Divides by the highest coefficient.
+// Divides by the highest coefficient. The complex quotient of a number and itself has the real part 1, but can have a
+// rounding error for its imaginary part.
 template <class T>
 void Normalise(T* c, int32_t size) {
     const T highest = c[size - 1];
     for (int32_t i = 0; i < size; ++i) c[i] = c[i] / highest;
+    c[size - 1] = FromReal<T>(RealPart(c[size - 1]));
 }
 
 // A polynomial of the caller's without its zeros at either end.

@@ -241,5 +241,15 @@ TEST_F(Divisors, OfComplexPolynomials) {
     expect(v, {0, 3});
 }
 
+TEST_F(Divisors, OfComplexPolynomialsAreMonicToTheLastBit) {
+    HostArray<Complex> p{{-10, 0}, {-21, -2}, {6, 10}, {6, 17}, {2, -5}, {2, 0}};
+    HostArray<Complex> q{{-22, 4}, {-5, -20}, {19, -14}, {6, -12}, {5, -5}, {1, 0}};
+    HostArray<Complex> gcd, u, v;
+    ASSERT_EQ(CxPolyGCD_H(p.handle(), q.handle(), 1e-4, gcd.handle(), u.handle(), v.handle(), 1), 0);
+    ASSERT_EQ(gcd.size(), 2);
+    EXPECT_NEAR(Modulus(gcd[0] - Complex{2, -4}), 0.0, 1e-12);
+    for (const auto* monic : {&gcd, &u, &v}) EXPECT_EQ((*monic)[monic->size() - 1], (Complex{1, 0}));
+}
+
 }  // namespace
 }  // namespace krnumer
