@@ -13,11 +13,16 @@
 namespace krnumer {
 namespace {
 
-// Data from this size on do not stay in the caches together with what they are made of and with the twiddles. They are
-// worth copying to tiles whatever the distance of their rows; smaller data only if it is a multiple of a page, so that
-// all rows compete for the same few places in the caches.
+// Data up to this size stay in the second-level cache between the passes; data from the other size on do not stay in any,
+// together with what they are made of and with the twiddles.
+constexpr size_t kCachedBytes = 512 * 1024;
 constexpr size_t kFarBytes = 6 * 1024 * 1024;
+
+// Far data are worth copying to tiles whatever the distance of their rows. Others are only if it is a multiple of a page,
+// so that all rows compete for the same few places in the caches, and if one stage combines more rows than those hold;
+// twice as many, where what was driven out is close at hand.
 constexpr size_t kPage = 4096;
+constexpr int32_t kTooManyRows = 16;
 
 // Sub-sequences up to this length are left to the factors behind those in tiles.
 constexpr int32_t kLongestSubsequence = 2048;
@@ -310,8 +315,15 @@ int32_t CountTiledFactors(const qmfft_table* table) {
     int32_t tiled = 0;
     for (; tiled < table->factorCount - 1 && length > kLongestSubsequence; length /= table->factors[tiled++])
         if (table->vectors[tiled] == nullptr) return 0;
+    if (tiled == 0 || AreFar<T>(table)) return tiled;
     const bool rows_collide = Count(length) * sizeof(T) % kPage == 0;
-    return rows_collide || AreFar<T>(table) ? tiled : 0;
+    const int32_t too_many = AreCached<T>(table) ? 2 * kTooManyRows : kTooManyRows;
+    return rows_collide && table->factors[tiled - 1] >= too_many ? tiled : 0;
+}
+
+template <class T>
+bool AreCached(const qmfft_table* table) {
+    return Count(table->length) * sizeof(T) <= kCachedBytes;
 }
 
 template <class T>
@@ -364,6 +376,8 @@ void PackTwiddlesInTiles(const qmfft_table* table, int32_t i, double* packed) {
 
 template int32_t CountTiledFactors<Complex>(const qmfft_table*);
 template int32_t CountTiledFactors<double>(const qmfft_table*);
+template bool AreCached<Complex>(const qmfft_table*);
+template bool AreCached<double>(const qmfft_table*);
 template bool AreFar<Complex>(const qmfft_table*);
 template bool AreFar<double>(const qmfft_table*);
 template int32_t LanesBeforeTiles<Complex>(int32_t);

@@ -10,14 +10,17 @@
 
 namespace krnumer {
 
-// How many of the first factors should have their stages run in tiles on elements T, Complex or double, if the data do
-// not stay in the cache anyway. The table's factors and kernels must stand; 0 where one lacks vector kernels.
+// Whether elements T, Complex or double, of the table's length stay in the second-level cache, and whether they come
+// from memory.
 template <class T>
-int32_t CountTiledFactors(const qmfft_table* table);
-
-// Whether elements T of the table's length come from memory rather than from the caches.
+bool AreCached(const qmfft_table* table);
 template <class T>
 bool AreFar(const qmfft_table* table);
+
+// How many of the first factors should have their stages run in tiles. The table's factors and kernels must stand; 0
+// where one lacks vector kernels.
+template <class T>
+int32_t CountTiledFactors(const qmfft_table* table);
 
 // How many neighbouring sub-sequences of `length` elements are transformed together before: as many as the cache holds.
 inline constexpr int32_t kMostLanes = 64;

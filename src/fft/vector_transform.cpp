@@ -22,9 +22,6 @@ namespace {
 template <class T>
 constexpr int32_t kGroup = 64 / sizeof(T);
 
-// Data up to this size stay in the second-level cache between the passes, and no pass needs to be cut into blocks.
-constexpr size_t kCachedBytes = 512 * 1024;
-
 void RunColumns(const qmfft_table* table, int32_t i, const Complex* in, ptrdiff_t step, Complex* out,
                 const ptrdiff_t* places, int32_t lanes) {
     table->vectors[i]->complex.columns(in, step, out, places, lanes);
@@ -225,8 +222,8 @@ template <class T>
 bool MakePlan(const qmfft_table* table, VectorPlan* plan) {
     const int32_t last = table->factorCount - 1;
     if (last < 0 || table->vectors[last] == nullptr) return true;
-    const bool cached = Count(table->length) * sizeof(T) <= kCachedBytes;
-    const int32_t tiled = cached ? 0 : CountTiledFactors<T>(table);
+    const bool cached = AreCached<T>(table);  // no pass needs to be cut into blocks then
+    const int32_t tiled = CountTiledFactors<T>(table);
     plan->tiled = tiled > 0;
     plan->far = plan->tiled && AreFar<T>(table);
     plan->length = table->length;
