@@ -19,11 +19,16 @@ constexpr double kLargestExponent = 709.782712893384;
 constexpr double kSqrtTwoPi = 2.5066282746310007;
 constexpr double kLnSqrtTwoPi = 0.9189385332046728;
 
-// Moves x >= 3 to 2 <= x < 3, and gives (x - 1) (x - 2) ... down to there. With the steps counted beforehand the
-// processor need not wait for x to find the end of the loop.
+// Moves x >= 3 to 2 <= x < 3, and gives (x - 1) (x - 2) ... down to there, in this order; the differences are exact.
+// With the steps counted beforehand, and four in a pass, the processor need not wait for x to find the end of the loop.
 double Descend(double& x) {
     double product = 1.0;
-    for (int32_t steps = static_cast<int32_t>(x) - 2; steps > 0; --steps) {
+    int32_t steps = static_cast<int32_t>(x) - 2;
+    for (; steps >= 4; steps -= 4) {
+        product = product * (x - 1.0) * (x - 2.0) * (x - 3.0) * (x - 4.0);
+        x -= 4.0;
+    }
+    for (; steps > 0; --steps) {
         x -= 1.0;
         product *= x;
     }
