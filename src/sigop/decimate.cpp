@@ -13,8 +13,8 @@ T SumOnto(T sum, const T* x, int64_t n) {
     return sum;
 }
 
-// Means of neighbouring blocks of m samples; out may lie at x or before. Four blocks advance together, because the
-// additions of one have to wait for each other.
+// Means of neighbouring blocks of m samples; out may lie at x or before, and one behind it where m > 1. Four blocks
+// advance together, because the additions of one have to wait for each other.
 template <class T>
 void BlockMeans(const T* x, int64_t blocks, int64_t m, T* out) {
     for (; blocks >= 4; blocks -= 4, x += 4 * m, out += 4) {
@@ -40,12 +40,14 @@ int64_t AverageStream(T* x, int64_t n, int64_t m, DecimationStream<T>* stream) {
     const bool open = partial != 0;
     int64_t means = std::clamp<int64_t>((open ? partial + n : n - start) / m, 0, n);
     if (means > 0) {
-        if (open) x[0] = SumOnto(sum, x, std::min(start, n)) / static_cast<double>(m);
+        // The open mean comes first, but x[0] itself belongs to a later one where the start is 0.
+        const T first = open ? SumOnto(sum, x, std::min(start, n)) / static_cast<double>(m) : T{};
         const int64_t whole = std::clamp<int64_t>((n - start) / m, 0, means - (open ? 1 : 0));
         BlockMeans(x + std::min(start, n), whole, m, x + (open ? 1 : 0));
         means = whole + (open ? 1 : 0);
         partial = n - m * whole - start;
         sum = SumOnto(T{}, x + (n - std::max<int64_t>(partial, 0)), partial);
+        if (open) x[0] = first;
         start = (m - partial) % m;
     } else if (open) {
         sum = SumOnto(sum, x, n);

@@ -121,6 +121,18 @@ TEST(DecimateContinuous, CountsDownToTheEndOfAMean) {
     EXPECT_EQ(stream.partial_sum, 0);
 }
 
+// A caller may say that an open mean needs no sample more.
+TEST(DecimateContinuous, ReadsTheFirstSampleBehindAMeanThatIsComplete) {
+    DecimationStream<double> stream{0, 1, -2};
+    EXPECT_THAT(Next<double>({1, 3, 5, 9, 4}, 2, true, &stream), ElementsAre(-1, 2, 7));
+    EXPECT_EQ(stream.start, 1);
+    EXPECT_EQ(stream.partial_count, 1);
+    EXPECT_EQ(stream.partial_sum, 4);
+    stream = {0, 1, 3};
+    EXPECT_THAT(Next<double>({0.5}, 2, true, &stream), ElementsAre(1.5));
+    EXPECT_EQ(stream.partial_sum, 0.5);
+}
+
 TEST(DecimateContinuous, ChecksBeforeItResets) {
     double x = 1;
     int32_t count = -1;
