@@ -75,7 +75,7 @@ int32_t CubicSplineFit_head(KrHandle y, KrHandle x, KrHandle w, KrHandle smoothW
     Result<double> left(call, residue);
     const int32_t n = ordinates.size();
     const auto fits = [](int32_t size, int32_t wanted) { return size == 0 || size == wanted; };
-    if (!fits(abscissas.size(), n) || !fits(weights.size(), n) || !fits(roughness.size(), n - 1))
+    if (!fits(abscissas.size(), n) || !fits(weights.size(), n) || !fits(roughness.size(), WrappingAdd(n, -1)))
         return call.Fail(kSizesDiffer);
     return call.Run([&]() -> int32_t {
         const auto given = [](const In<double>& array) { return array.size() > 0 ? array.data() : nullptr; };

@@ -1,3 +1,5 @@
+#include <algorithm>
+
 #include "frame/entry.h"
 #include "krnumer/polynomial.h"
 #include "poly/evaluation.h"
@@ -30,10 +32,13 @@ int32_t PolyRootsNtBst_head(KrHandle coef, KrHandle newtonGuesses, int32_t newto
     In<Complex> pairs(call, pairGuesses);
     Out<Complex> found(call, roots);
     if (coefficients.size() < 1) return call.Fail(kWarnEmptyPolynomial);  // a warning that leaves nothing behind
-    if (found.Resize(WrappingAdd(guesses.size(), pairs.size()))) return call.Fail(kOutOfMemory);
+    // A malformed array of guesses holds none: its count must not take from the room of the other's roots.
+    const int32_t real_count = std::max(guesses.size(), 0);
+    const int32_t pair_count = std::max(pairs.size(), 0);
+    if (found.Resize(WrappingAdd(real_count, pair_count))) return call.Fail(kOutOfMemory);
     return call.Run([&] {
-        return RootsFromGuesses(coefficients.data(), coefficients.size(), guesses.data(), guesses.size(), newtonLimit,
-                                newtonTol, pairs.data(), pairs.size(), pairLimit, pairTol, found.data());
+        return RootsFromGuesses(coefficients.data(), coefficients.size(), guesses.data(), real_count, newtonLimit,
+                                newtonTol, pairs.data(), pair_count, pairLimit, pairTol, found.data());
     });
 }
 

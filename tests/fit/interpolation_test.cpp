@@ -163,6 +163,13 @@ class Splines : public testing::Test {
     }
 };
 
+TEST_F(Splines, RefuseMalformedArrays) {
+    HostArray<double> y{1, 2, 3}, x{1, 2, 3}, none;
+    y.SetDimension(0, INT32_MIN);
+    EXPECT_EQ(CubicSplineFit_head(y.handle(), x.handle(), none.handle(), none.handle(), 0.5, &residue_), kSizesDiffer);
+    EXPECT_TRUE(y.empty());
+}
+
 TEST_F(Splines, AgreeWithSciPy) {
     for (const SplineReference& one : References()) {
         if (one.kind == "smooth") {

@@ -128,6 +128,23 @@ TEST_F(GuessedRoots, OfNothing) {
     EXPECT_TRUE(roots_.empty());
 }
 
+TEST_F(GuessedRoots, TakeMalformedGuessesForNone) {
+    const HostArray<double> cubic{-6, 11, -6, 1};
+    HostArray<double> real{0.9, 2.1, 3.1};
+    HostArray<Complex> pairs{{1, 0}, {2, 0}};
+    const auto refine = [&] {
+        return PolyRootsNtBst_head(cubic.handle(), real.handle(), 50, 1e-14, pairs.handle(), 50, 1e-14,
+                                   roots_.handle());
+    };
+    pairs.SetDimension(0, -2);
+    ASSERT_EQ(refine(), 0);
+    EXPECT_EQ(roots_.size(), 3);
+    pairs.SetDimension(0, 2);
+    real.SetDimension(0, -1);
+    ASSERT_EQ(refine(), 0);
+    EXPECT_EQ(roots_.size(), 2);
+}
+
 // ---- Divisors ----
 
 Values Product(const Values& a, const Values& b) {
