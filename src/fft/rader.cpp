@@ -1,9 +1,11 @@
 #include "fft/rader.h"
 
 #include <cstddef>
+#include <type_traits>
 
 #include "fft/half_complex.h"
 #include "fft/stage.h"
+#include "fft/vector_transform.h"
 #include "frame/complex.h"
 #include "frame/numeric.h"
 #include "frame/scratch.h"
@@ -47,14 +49,18 @@ struct Split {
     }
 };
 
-// The transform of the convolution of `count` = r - 1 values, conjugated: z becomes the conjugate of z times the
-// kernel's spectrum, so that one more forward transform gives the conjugate of the inverse one.
+// A value of the convolution's spectrum, which is the conjugate of the samples' times the kernel's, so that one more
+// forward transform gives the conjugate of the inverse one.
+Complex ConjugateProduct(Complex z, Complex w) {
+    return {z.re * w.re - z.im * w.im, -z.re * w.im - z.im * w.re};
+}
+
 template <class Values>
 void MultiplyByKernel(const stage_tables& tables, const Values& values, int32_t count) {
     for (int32_t k = 0; k < count; ++k) {
         const Complex z = values.Get(k);
         const Complex w{tables.raderRe[k], tables.raderIm[k]};
-        values.Put(k, {z.re * w.re - z.im * w.im, -z.re * w.im - z.im * w.re});
+        values.Put(k, ConjugateProduct(z, w));
     }
 }
 
@@ -91,6 +97,63 @@ int32_t RaderComplex(int32_t r, const double* in_re, const double* in_im, double
     }
     const auto in = [=](ptrdiff_t k) { return Complex{in_re[k * in_stride], in_im[k * in_stride]}; };
     return TransformByRader(r, in, Split{out_re, out_im, out_stride}, tables, work);
+}
+
+// Transforms of neighbouring sequences run side by side as long as their work stays in the caches: what each value of
+// one waits for is done for several.
+constexpr int32_t kMostLanes = 8;
+constexpr int32_t kLongestLane = 1024;
+
+// Vectors should not straddle cache lines.
+constexpr size_t kLine = 64 / sizeof(Complex);
+
+Complex* NextLine(Complex* work) {
+    const size_t behind = reinterpret_cast<uintptr_t>(work) / sizeof(Complex) % kLine;
+    return work + (kLine - behind) % kLine;
+}
+
+bool RunsInLanes(int32_t r, const stage_tables& tables) {
+    const VectorPlan& plan = tables.raderTable->complexPlan;
+    return r <= kLongestLane && plan.sequences > 0 && !plan.tiled;
+}
+
+// `lanes` sequences l of r complex samples in(k, l); out(k, l, value) takes the results. `work` holds 2 lanes (r - 1)
+// values.
+template <int32_t lanes, class In, class Out>
+int32_t TransformLanesByRader(int32_t r, const In& in, const Out& out, const stage_tables& tables, Complex* work) {
+    const int32_t count = r - 1;
+    Complex* const side_by_side = work;
+    Complex* const one_by_one = work + ptrdiff_t{lanes} * count;
+    ptrdiff_t places[lanes];
+    Complex first[lanes], total[lanes];
+    for (int32_t l = 0; l < lanes; ++l) {
+        places[l] = ptrdiff_t{l} * count;
+        first[l] = total[l] = in(0, l);
+    }
+    const auto transform = [&] {
+        return VectorComplexFFTs(tables.raderTable, side_by_side, lanes, one_by_one, places, lanes);
+    };
+    for (int32_t k = 0; k < count; ++k) {
+        Complex* const row = side_by_side + ptrdiff_t{k} * lanes;
+        for (int32_t l = 0; l < lanes; ++l) {
+            row[l] = in(tables.raderIn[k + 1], l);
+            total[l] += row[l];
+        }
+    }
+    for (int32_t l = 0; l < lanes; ++l) out(0, l, total[l]);
+    if (const int32_t status = transform()) return status;
+    for (int32_t k = 0; k < count; ++k) {
+        const Complex w{tables.raderRe[k], tables.raderIm[k]};
+        Complex* const row = side_by_side + ptrdiff_t{k} * lanes;
+        for (int32_t l = 0; l < lanes; ++l) row[l] = ConjugateProduct(one_by_one[places[l] + k], w);
+    }
+    if (const int32_t status = transform()) return status;
+    for (int32_t l = 0; l < lanes; ++l) {
+        const Complex* const result = one_by_one + places[l];
+        for (int32_t k = 0; k < count; ++k)
+            out(tables.raderOut[k + 1], l, {first[l].re + result[k].re, first[l].im - result[k].im});
+    }
+    return kOk;
 }
 
 // r real samples to half-complex form; in place is allowed. `work` and `spectrum` hold r - 1 values each.
@@ -177,19 +240,37 @@ int32_t RaderRealLeaf(int32_t r, const stage_tables& tables, const double* in, d
 
 int32_t RaderComplexLeaf(int32_t r, const stage_tables& tables, const double* in_re, const double* in_im,
                          double* out_re, double* out_im, int32_t in_stride, int32_t out_stride, int32_t how_many) {
-    Scratch<Complex> work(Count(r));
-    if (!work) return kOutOfMemory;
     const ptrdiff_t step = ptrdiff_t{in_stride} * how_many;
     const ptrdiff_t block = ptrdiff_t{r} * out_stride;
-    for (int32_t i = 0; i < how_many; ++i) {
-        if (const int32_t status =
-                RaderComplex(r, in_re, in_im, out_re, out_im, tables, step, out_stride, work.data())) {
+    const bool lanes = how_many > 1 && in_im == in_re + 1 && out_im == out_re + 1 && RunsInLanes(r, tables);
+    Scratch<Complex> work(lanes ? 2 * kMostLanes * Count(r) + kLine : Count(r));
+    if (!work) return kOutOfMemory;
+    int32_t i = 0;
+    const auto run_lanes = [&]<int32_t count>(std::integral_constant<int32_t, count>) {
+        for (; how_many - i >= count; i += count) {
+            const auto in = [from = in_re + ptrdiff_t{i} * in_stride, in_stride, step](ptrdiff_t k, ptrdiff_t l) {
+                return *reinterpret_cast<const Complex*>(from + l * in_stride + k * step);
+            };
+            const auto out = [to = out_re + i * block, block, out_stride](ptrdiff_t k, ptrdiff_t l, Complex value) {
+                *reinterpret_cast<Complex*>(to + l * block + k * out_stride) = value;
+            };
+            if (const int32_t status = TransformLanesByRader<count>(r, in, out, tables, NextLine(work.data())))
+                return status;
+        }
+        return kOk;
+    };
+    if (lanes) {
+        if (const int32_t status = run_lanes(std::integral_constant<int32_t, kMostLanes>())) return status;
+        if (const int32_t status = run_lanes(std::integral_constant<int32_t, kMostLanes / 2>())) return status;
+        if (const int32_t status = run_lanes(std::integral_constant<int32_t, kMostLanes / 4>())) return status;
+    }
+    for (; i < how_many; ++i) {
+        const ptrdiff_t from = ptrdiff_t{i} * in_stride;
+        const ptrdiff_t to = i * block;
+        if (const int32_t status = RaderComplex(r, in_re + from, in_im + from, out_re + to, out_im + to, tables, step,
+                                                out_stride, work.data())) {
             return status;
         }
-        in_re += in_stride;
-        in_im += in_stride;
-        out_re += block;
-        out_im += block;
     }
     return kOk;
 }

@@ -13,14 +13,14 @@
 namespace krnumer {
 namespace {
 
-// Data up to this size stay in the second-level cache between the passes; data from the other size on do not stay in any,
-// together with what they are made of and with the twiddles.
+// Data up to this size stay in the second-level cache between the passes; data from the other size on do not stay in
+// any, together with what they are made of and with the twiddles.
 constexpr size_t kCachedBytes = 512 * 1024;
 constexpr size_t kFarBytes = 6 * 1024 * 1024;
 
-// Far data are worth copying to tiles whatever the distance of their rows. Others are only if it is a multiple of a page,
-// so that all rows compete for the same few places in the caches, and if one stage combines more rows than those hold;
-// twice as many, where what was driven out is close at hand.
+// Far data are worth copying to tiles whatever the distance of their rows. Others are only if it is a multiple of a
+// page, so that all rows compete for the same few places in the caches, and if one stage combines more rows than those
+// hold; twice as many, where what was driven out is close at hand.
 constexpr size_t kPage = 4096;
 constexpr int32_t kTooManyRows = 16;
 

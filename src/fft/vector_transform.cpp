@@ -256,6 +256,11 @@ int32_t VectorRealFFT(const qmfft_table* table, const double* in, double* out) {
     return Transform(table, table->realPlan, in, out);
 }
 
+int32_t VectorComplexFFTs(const qmfft_table* table, const Complex* in, ptrdiff_t step, Complex* out,
+                          const ptrdiff_t* places, int32_t lanes) {
+    return TransformLanes(table, 0, table->length, in, step, out, places, lanes);
+}
+
 template <class T>
 size_t CountStageTwiddles(const qmfft_table* table, int32_t i, int32_t m) {
     if (RunsInTiles<T>(table, i)) return PackedCountInTiles<T>(table, i);

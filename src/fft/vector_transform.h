@@ -17,6 +17,11 @@ bool MakePlan(const qmfft_table* table, VectorPlan* plan);
 int32_t VectorComplexFFT(const qmfft_table* table, const double* in, double* out);
 int32_t VectorRealFFT(const qmfft_table* table, const double* in, double* out);
 
+// Forward transforms of `lanes` neighbouring sequences by a plan that is neither empty nor tiled: sample j of sequence
+// l is in[l + j step], and its result goes to out[places[l]] and behind.
+int32_t VectorComplexFFTs(const qmfft_table* table, const Complex* in, ptrdiff_t step, Complex* out,
+                          const ptrdiff_t* places, int32_t lanes);
+
 // Twiddles of factor i of a table, which combines blocks of length m, in the order of the plan for elements T.
 template <class T>
 size_t CountStageTwiddles(const qmfft_table* table, int32_t i, int32_t m);
