@@ -87,10 +87,11 @@ const T* LeafSamples(const qmfft_table* table, const VectorPlan& plan, const T* 
     return in;
 }
 
-// Fetches a line of samples that are `step` apart.
+// Fetches samples j of `lanes` sub-sequences, from j on to before `end`.
 template <class T>
-KRNUMER_FFT_INLINE void FetchSamples(const T* in, ptrdiff_t step, int32_t count) {
-    for (int32_t j = 0; j < count; ++j) FetchLine(in + j * step);
+KRNUMER_FFT_INLINE void FetchSamples(const T* in, ptrdiff_t step, int32_t j, int32_t end, int32_t lanes) {
+    for (; j < end; ++j)
+        for (int32_t l = 0; l < lanes; l += kGroup<T>) FetchLine(in + j * step + l);
 }
 
 // The leaves of `lanes` neighbouring sub-sequences. Those of the `following` next ones come after them.
@@ -107,8 +108,9 @@ void TransformFarLeaves(const qmfft_table* table, const VectorPlan& plan, const 
         const T* next = ends ? in + lanes : LeafSamples(table, plan, in, q + 1);
         const int32_t fetched = ends ? following : lanes;
         for (int32_t l = 0; l < lanes; l += kGroup<T>) {
-            if (l < fetched) FetchSamples(next + l, step, r);
-            RunColumns(table, last, x + l, step, out + ptrdiff_t{q} * r, places + l, std::min(kGroup<T>, lanes - l));
+            const int32_t count = std::min(kGroup<T>, lanes - l);
+            FetchSamples(next, step, r * l / lanes, r * (l + count) / lanes, fetched);
+            RunColumns(table, last, x + l, step, out + ptrdiff_t{q} * r, places + l, count);
         }
     }
 }
