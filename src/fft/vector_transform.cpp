@@ -94,15 +94,23 @@ KRNUMER_FFT_INLINE void FetchSamples(const T* in, ptrdiff_t step, int32_t j, int
         for (int32_t l = 0; l < lanes; l += kGroup<T>) FetchLine(in + j * step + l);
 }
 
-// The leaves of `lanes` neighbouring sub-sequences. Those of the `following` next ones come after them.
+// Fetches where `lanes` sub-sequences put their next `count` values: a line is not written before it is there.
+template <class T>
+KRNUMER_FFT_INLINE void FetchPlaces(const T* out, const ptrdiff_t* places, int32_t lanes, int32_t count) {
+    for (int32_t l = 0; l < lanes; ++l)
+        for (int32_t k = 0; k < count; k += kGroup<T>) FetchLine(out + places[l] + k);
+}
+
+// The leaves of `lanes` neighbouring sub-sequences. Those of the `following` next ones come after them. Their places in
+// `out` may be far, too.
 template <class T>
 void TransformFarLeaves(const qmfft_table* table, const VectorPlan& plan, const T* in, int32_t lanes, int32_t following,
-                        T* out, const ptrdiff_t* places) {
+                        T* out, const ptrdiff_t* places, bool far_places) {
     const int32_t last = table->factorCount - 1;
     const int32_t r = table->factors[last];
     const int32_t leaves = plan.length / r;
     const ptrdiff_t step = table->length / r;
-    for (int32_t q = 0; q < leaves; ++q) {
+    for (int32_t q = 0; q < leaves; ++q, out += r) {
         const bool ends = q == leaves - 1;
         const T* x = LeafSamples(table, plan, in, q);
         const T* next = ends ? in + lanes : LeafSamples(table, plan, in, q + 1);
@@ -110,7 +118,8 @@ void TransformFarLeaves(const qmfft_table* table, const VectorPlan& plan, const 
         for (int32_t l = 0; l < lanes; l += kGroup<T>) {
             const int32_t count = std::min(kGroup<T>, lanes - l);
             FetchSamples(next, step, r * l / lanes, r * (l + count) / lanes, fetched);
-            RunColumns(table, last, x + l, step, out + ptrdiff_t{q} * r, places + l, count);
+            if (far_places && !ends) FetchPlaces(out + r, places + l, count, r);
+            RunColumns(table, last, x + l, step, out, places + l, count);
         }
     }
 }
@@ -140,7 +149,7 @@ template <class T>
 int32_t TransformFarLanes(const qmfft_table* table, const VectorPlan& plan, const T* in, T* out) {
     return ForEachGroup(plan, [&](int32_t start, int32_t lanes, int32_t following) {
         const ptrdiff_t* places = plan.places + start;
-        TransformFarLeaves(table, plan, in + start, lanes, following, out, places);
+        TransformFarLeaves(table, plan, in + start, lanes, following, out, places, true);
         for (int32_t l = 0; l < lanes; ++l)
             if (const int32_t status = RunStagesOfLane(table, plan, out + places[l])) return status;
         return kOk;
@@ -154,7 +163,7 @@ KRNUMER_FFT_NOINLINE int32_t StreamFarLanes(const qmfft_table* table, const Vect
     ptrdiff_t places[kMostLanes];
     for (int32_t l = 0; l < plan.together; ++l) places[l] = ptrdiff_t{l} * (plan.length + kGroup<Complex>);
     const int32_t status = ForEachGroup(plan, [&](int32_t start, int32_t lanes, int32_t following) {
-        TransformFarLeaves(table, plan, in + start, lanes, following, results, places);
+        TransformFarLeaves(table, plan, in + start, lanes, following, results, places, false);
         for (int32_t l = 0; l < lanes; ++l) {
             Complex* const lane = results + places[l];
             if (const int32_t failure = RunStagesOfLane(table, plan, lane)) return failure;
