@@ -28,7 +28,7 @@ namespace krrt {
 namespace {
 
 // Guards the lists of all instances; never held while a clean-up runs.
-constinit std::mutex lists;
+std::mutex lists;
 constinit KrrtInstance default_instance{};
 constinit thread_local KrrtInstance* current = nullptr;
 

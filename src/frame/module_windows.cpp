@@ -24,7 +24,7 @@ void Fatal(const char* message) {
 
 }  // namespace krnumer::module
 
-BOOL APIENTRY DllMain(HMODULE module, DWORD reason, LPVOID) {
+extern "C" BOOL APIENTRY DllMain(HMODULE module, DWORD reason, LPVOID) {
     if (reason == DLL_PROCESS_ATTACH) DisableThreadLibraryCalls(module);
     return TRUE;
 }
