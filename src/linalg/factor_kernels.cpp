@@ -133,7 +133,9 @@ HWY_INLINE size_t SolveColumns(D d, const DiagonalSquare<T>& square, T* const* r
 
 template <class T>
 void Subtract(const ProductOperands<T>& in) {
-    const size_t column = SubtractColumns<2>(hn::ScalableTag<double>(), in, 0);
+    const hn::ScalableTag<double> d;
+    const size_t first = in.rows == 1 ? SubtractColumns<8>(d, in, 0) : 0;
+    const size_t column = SubtractColumns<2>(d, in, first);
     ByFallingLength<T>(column, [&in](auto d, size_t first) HWY_ATTR { return SubtractColumns<1>(d, in, first); });
 }
 

@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <cstddef>
 #include <functional>
+#include <numeric>
 #include <utility>
 
 #include "frame/numeric.h"
@@ -10,6 +11,7 @@
 #include "frame/status.h"
 #include "linalg/element.h"
 #include "linalg/factor_kernels.h"
+#include "linalg/finite.h"
 #include "linalg/lu.h"
 #include "linalg/row_sums.h"
 
@@ -46,22 +48,26 @@ int32_t SolveUpper(const T* lu, size_t n, T* x) {
     return kOk;
 }
 
-// The two substitutions on all columns of a matrix at once, each column by the same operations as above.
+// The two substitutions on neighbouring columns of a matrix at once, each column by the same operations as above.
 template <class T>
-class ManyColumns {
+class Strip {
   public:
-    // sums: kTogether rows of n elements.
-    ManyColumns(const T* lu, size_t n, T* x, T* sums) : lu_(lu), n_(n), x_(x), sums_(sums) {}
+    // At most this many columns, which the cache keeps from one row to the next.
+    static constexpr size_t kWidth = 64;
 
-    void SolveUnitLower() {
-        for (size_t first = 0; first < n_; first += kTogether) {
-            const size_t count = std::min(kTogether, n_ - first);
-            std::fill_n(sums_, count * n_, T{});
-            SubtractTerms(first, count, 0, first, sums_);
-            for (size_t row = 0; row < count; ++row) {
-                T* const sum = sums_ + row * n_;
-                SubtractTerms(first + row, 1, first, first + row, sum);
-                std::transform(Row(first + row), Row(first + row + 1), sum, Row(first + row), std::plus<>());
+    // x: n rows of `count` elements.
+    Strip(const T* lu, size_t n, T* x, size_t count) : lu_(lu), n_(n), x_(x), count_(count) {}
+
+    // The rows before `begin` are zero and stay so.
+    void SolveUnitLower(size_t begin) {
+        for (size_t first = begin; first < n_; first += kTogether) {
+            const size_t rows = std::min(kTogether, n_ - first);
+            std::fill_n(sums_, rows * count_, T{});
+            SubtractTerms(first, rows, begin, first, sums_);
+            for (size_t row = first; row < first + rows; ++row) {
+                T* const sum = sums_ + (row - first) * count_;
+                SubtractTerms(row, 1, first, row, sum);
+                std::transform(Row(row), Row(row) + count_, sum, Row(row), std::plus<>());
             }
         }
     }
@@ -70,34 +76,35 @@ class ManyColumns {
         for (size_t i = n_; i-- > 0;) {
             const T pivot = lu_[i * n_ + i];
             if (pivot == T{}) return;
-            std::fill_n(sums_, n_, T{});
+            std::fill_n(sums_, count_, T{});
             SubtractTerms(i, 1, i + 1, n_, sums_);
-            for (size_t j = 0; j < n_; ++j) Row(i)[j] = (Row(i)[j] + sums_[j]) / pivot;
+            for (size_t j = 0; j < count_; ++j) Row(i)[j] = (Row(i)[j] + sums_[j]) / pivot;
         }
     }
 
   private:
-    T* Row(size_t i) { return x_ + i * n_; }
+    T* Row(size_t i) { return x_ + i * count_; }
 
     // sums -= rows of the factor, from column `term` up to `end`, times the rows of X with these numbers.
     void SubtractTerms(size_t row, size_t rows, size_t term, size_t end, T* sums) {
         if (term == end) return;
         SubtractProduct(ProductOperands<T>{.c = sums,
-                                           .c_row = {n_},
+                                           .c_row = {count_},
                                            .a = lu_ + row * n_ + term,
                                            .a_row = n_,
                                            .a_term = {1},
                                            .b = Row(term),
-                                           .b_term = {n_},
+                                           .b_term = {count_},
                                            .rows = rows,
-                                           .columns = n_,
+                                           .columns = count_,
                                            .terms = end - term});
     }
 
     const T* lu_;
     size_t n_;
     T* x_;
-    T* sums_;
+    size_t count_;
+    T sums_[kTogether * kWidth];
 };
 
 }  // namespace
@@ -119,22 +126,32 @@ int32_t LUSolve(const T* lu, const int32_t* pivots, const T* b, int32_t n, T* x)
 template <class T>
 int32_t LUInverse(const T* lu, const int32_t* pivots, int32_t order, T* inverse) {
     if (order < 1) return kEmptyInput;
-    const size_t n = Count(order), sums_count = kTogether * n;
-    Scratch<T> work(sums_count + (inverse == lu ? n * n : 0));
-    if (!work) return kOutOfMemory;
+    const size_t n = Count(order), strip_count = n * std::min(n, Strip<T>::kWidth);
+    Scratch<T> work(strip_count + (inverse == lu ? n * n : 0));
+    Scratch<int32_t> places(n);
+    if (!work || !places) return kOutOfMemory;
+    T* const x = work.data();
     if (inverse == lu) {
-        std::copy_n(lu, n * n, work.data() + sums_count);
-        lu = work.data() + sums_count;
+        std::copy_n(lu, n * n, x + strip_count);
+        lu = x + strip_count;
     }
-    std::fill_n(inverse, n * n, T{});
-    for (size_t i = 0; i < n; ++i) inverse[i * (n + 1)] = FromReal<T>(1.0);
-    for (size_t i = 0; i < n; ++i) {
-        const size_t other = Count(pivots[i]);
-        if (other != i) std::swap_ranges(inverse + i * n, inverse + (i + 1) * n, inverse + other * n);
+    // The columns of the inverse of L U are exchanged as the rows of A were.
+    int32_t* const place = places.data();
+    std::iota(place, place + n, 0);
+    for (size_t i = 0; i < n; ++i) std::swap(place[i], place[Count(pivots[i])]);
+
+    // Products with zeros may be NaN where the factors are not finite.
+    const bool skips_zeros = n > Strip<T>::kWidth && !HasUnusable(lu, n * n);
+    for (size_t first = 0; first < n; first += Strip<T>::kWidth) {
+        const size_t count = std::min(n - first, Strip<T>::kWidth);
+        std::fill_n(x, n * count, T{});
+        for (size_t j = 0; j < count; ++j) x[(first + j) * count + j] = FromReal<T>(1.0);
+        Strip<T> strip(lu, n, x, count);
+        strip.SolveUnitLower(skips_zeros ? first : 0);
+        strip.SolveUpper();
+        for (size_t i = 0; i < n; ++i)
+            for (size_t j = 0; j < count; ++j) inverse[i * n + Count(place[first + j])] = x[i * count + j];
     }
-    ManyColumns<T> columns(lu, n, inverse, work.data());
-    columns.SolveUnitLower();
-    columns.SolveUpper();
     return kOk;
 }
 
