@@ -1,10 +1,10 @@
 #include "gen/pattern.h"
 
 #include <algorithm>
-#include <cmath>
 
 #include "frame/numeric.h"
 #include "frame/status.h"
+#include "gen/sines.h"
 #include "gen/wave.h"
 
 namespace krnumer {
@@ -61,11 +61,12 @@ int32_t PulsePattern(double* y, int32_t n, double amplitude, int32_t delay, int3
 int32_t SincPattern(double* y, int32_t n, double amplitude, double delay, double dt) {
     if (n < 1) return kEmptyInput;
     if (dt <= 0.0) return kBadSamplingInterval;
-    for (int32_t i = 0; i < n; ++i) {
-        const double u = (i * dt - delay) * kPi;
-        const bool off_peak = u < 0.0 || u > 0.0;  // a time that is not a number counts as the peak
-        y[i] = off_peak ? std::sin(u) / u * amplitude : amplitude;
-    }
+    SampleAngles(
+        y, n, Sines, [=](int32_t i) { return (i * dt - delay) * kPi; },
+        [=](double u, double sine) {
+            const bool off_peak = u < 0.0 || u > 0.0;  // a time that is not a number counts as the peak
+            return off_peak ? sine / u * amplitude : amplitude;
+        });
     return kOk;
 }
 

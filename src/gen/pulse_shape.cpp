@@ -4,6 +4,7 @@
 
 #include "frame/numeric.h"
 #include "frame/status.h"
+#include "gen/sines.h"
 
 namespace krnumer {
 
@@ -69,10 +70,13 @@ int32_t GaussianPulse(const double* time, double* y, int32_t n, double amplitude
     if (n < 1) return kEmptyInput;
     if (dt <= 0.0) return kBadSamplingInterval;
     const double decay = -5.0 * (bandwidth * bandwidth) / kLn10 / attenuation;
-    return SampleShape(time, y, n, delay, dt, [=](double t) {
-        const double u = kPi * fc * t;
-        return std::exp(decay * (u * u)) * std::cos(2.0 * u) * amplitude;
-    });
+    SampleAngles(
+        y, n, Cosines, [=](int32_t i) { return 2.0 * (kPi * fc * (time != nullptr ? time[i] : i * dt - delay)); },
+        [=](double angle, double cosine) {
+            const double u = 0.5 * angle;
+            return std::exp(decay * (u * u)) * cosine * amplitude;
+        });
+    return kOk;
 }
 
 int32_t PeriodicSinc(const double* time, double* y, int32_t n, double amplitude, int32_t order, double dt,

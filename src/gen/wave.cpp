@@ -6,6 +6,7 @@
 #include "frame/numeric.h"
 #include "frame/status.h"
 #include "gen/phase.h"
+#include "gen/sines.h"
 
 namespace krnumer {
 
@@ -96,7 +97,9 @@ int32_t Chirp(double* y, int32_t n, double amplitude, double f1, double f2) {
     if (n < 1) return kEmptyInput;
     const double sweep = (f2 - f1) * kPi / n;
     const double start = 2.0 * kPi * f1;
-    for (int32_t i = 0; i < n; ++i) y[i] = amplitude * std::sin((i * sweep + start) * i);
+    SampleAngles(
+        y, n, Sines, [=](int32_t i) { return (i * sweep + start) * i; },
+        [=](double, double sine) { return amplitude * sine; });
     return kOk;
 }
 
