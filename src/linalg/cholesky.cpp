@@ -43,9 +43,9 @@ class PackedRows {
     size_t n_;
 };
 
-// U of the leading `order` rows and columns of a square; false when it is not positive definite.
-template <class T>
-bool FactorSquare(DiagonalSquare<T>& u, size_t order) {
+// U of the leading `order` rows and columns of a square or of packed rows; false when it is not positive definite.
+template <class T, class Rows>
+bool FactorLeading(Rows& u, size_t order) {
     for (size_t j = 0; j < order; ++j) {
         for (size_t k = 0; k < j; ++k)
             for (size_t i = j; i < order; ++i) u[j][i] -= u[k][i] * Conjugate(u[k][j]);
@@ -57,17 +57,21 @@ bool FactorSquare(DiagonalSquare<T>& u, size_t order) {
     return true;
 }
 
+// So few rows are not worth the call of a kernel.
+constexpr size_t kFew = 10;
+
 template <class T>
 int32_t Factor(T* packed, int32_t order) {
     if (order < 1) return kEmptyInput;
     const size_t n = Count(order);
     const PackedRows<T> rows(packed, n);
+    if (n <= kFew) return FactorLeading<T>(rows, n) ? kOk : kNotPositiveDefinite;
     for (size_t first = 0; first < n; first += kRowsTogether) {
         const size_t count = std::min(kRowsTogether, n - first), last = first + count;
         DiagonalSquare<T> square{};
         for (size_t j = 0; j < count; ++j) std::copy_n(rows[first + j] + first + j, count - j, square[j] + j);
         rows.SubtractEarlier(square[0], {kRowsTogether}, first, count, first, count);
-        if (!FactorSquare(square, count)) return kNotPositiveDefinite;
+        if (!FactorLeading<T>(square, count)) return kNotPositiveDefinite;
         for (size_t j = 0; j < count; ++j) std::copy_n(square[j] + j, count - j, rows[first + j] + first + j);
         if (last == n) break;
         rows.SubtractEarlier(rows[first] + last, {n - first - 1, 1}, first, count, last, n - last);
