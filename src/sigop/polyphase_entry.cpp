@@ -47,7 +47,7 @@ int32_t Resample(KrHandle x, int32_t up, int32_t down, int32_t reset, int32_t* s
     InOut<T, Rank> kept(call, history);
     Out<T, Rank> resampled(call, y);
 
-    RationalRate rate{up, down, nullptr, taps.size()};
+    RationalRate rate{up, down, nullptr, std::max(taps.size(), 0)};
     if (const int32_t status = CheckRational(rate, {*start, *history_count})) return call.Fail(status);
     const int32_t channels = Channels(samples);
     bool fresh = reset != 0;

@@ -192,6 +192,16 @@ TEST_F(PolyphaseExports, ResetKeepsTheStart) {
     EXPECT_THAT(y_.values(), ElementsAre(3, 4.5, 6));
 }
 
+TEST_F(PolyphaseExports, MalformedFilterHasNoTaps) {
+    for (const int32_t taps : {-7, INT32_MIN}) {
+        filter_.SetDimension(0, taps);
+        EXPECT_EQ(RationalResample_H(x_.handle(), 2, 3, 1, &start_, filter_.handle(), history_.handle(), &count_,
+                                     y_.handle()),
+                  kEvenLength);
+        EXPECT_TRUE(y_.empty());
+    }
+}
+
 TEST_F(PolyphaseExports, ChannelsShareTheirPosition) {
     for (int block = 0; block < 2; ++block) {
         EXPECT_EQ(RationalResampleMultiCh_H(mx_.handle(), 2, 3, block == 0, &start_, filter_.handle(),

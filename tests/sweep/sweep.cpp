@@ -5,6 +5,7 @@
 #include <cmath>
 #include <cstdio>
 #include <cstring>
+#include <utility>
 
 #include "frame/numeric.h"
 
@@ -59,14 +60,21 @@ KrHandle Scene::NewArray(int32_t type_code, std::vector<int32_t> dimensions, con
                             : d.size() == 2 ? KrrtNewMatrix(type_code, d[0], d[1])
                                             : KrrtNewCube(type_code, d[0], d[1], d[2]);
     if (count > 0) std::memcpy(KrrtElements(handle), elements, count * ElementBytes(type_code));
-    arrays_.push_back({handle, type_code, false, OnFailure::kOther});
-    return handle;
+    return Keep(handle, type_code);
 }
 
 KrHandle Scene::NewRecords(int32_t bytes, int32_t count, const void* elements) {
     const KrHandle handle = KrrtNewRecords(bytes, count);
     if (count > 0) std::memcpy(KrrtElements(handle), elements, static_cast<size_t>(bytes) * static_cast<size_t>(count));
-    arrays_.push_back({handle, kRecords, false, OnFailure::kOther});
+    return Keep(handle, kRecords);
+}
+
+KrHandle Scene::Keep(KrHandle handle, int32_t type_code) {
+    if (malformed_ != nullptr && std::cmp_equal(malformed_->array, arrays_.size())) {
+        malformed_->met = true;
+        for (int32_t axis = 0; axis < KrrtRank(handle); ++axis) KrrtSetSize(handle, axis, malformed_->size);
+    }
+    arrays_.push_back({handle, type_code, false, OnFailure::kOther});
     return handle;
 }
 

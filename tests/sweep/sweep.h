@@ -12,8 +12,9 @@
 //
 // The sweep plays it: with both alignments of elements and with blocks that move at every resize, expecting the same
 // results to the bit; with each resize failing in turn and each allocation failing in turn, expecting a clear status
-// and outputs in their failure state; with garbage in *err and in the outputs beforehand. It leaves no block of the
-// host and no memory behind. The fuzzer plays the same scenes with varied arguments.
+// and outputs in their failure state; with garbage in *err and in the outputs beforehand; with each array in turn
+// malformed, for the sanitizers to watch. It leaves no block of the host and no memory behind. The fuzzer plays the
+// same scenes with varied arguments.
 #pragma once
 
 #include <array>
@@ -38,10 +39,18 @@ enum class OnFailure {
     kOther,    // whatever the function documents; not looked at
 };
 
+// An array whose dimension words a careless caller left below 0.
+struct Malformed {
+    int32_t array;     // which one of the scene, in the order in which they are made
+    int32_t size;      // of all its dimensions
+    bool met = false;  // the scene has such an array
+};
+
 class Scene {
   public:
     explicit Scene(int32_t refused_allocation = 0) : refused_allocation_(refused_allocation) {}
     explicit Scene(Variation* variation) : variation_(variation) {}
+    explicit Scene(Malformed* malformed) : malformed_(malformed) {}
     ~Scene();
     Scene(const Scene&) = delete;
     Scene& operator=(const Scene&) = delete;
@@ -177,6 +186,7 @@ class Scene {
     KrHandle NewArray(int32_t type_code, std::vector<int32_t> dimensions, const void* elements);
     KrHandle NewRecords(int32_t bytes, int32_t count, const void* elements);
     KrHandle NewOutput(int32_t type_code, int rank, OnFailure on_failure);
+    KrHandle Keep(KrHandle handle, int32_t type_code);
 
     std::vector<Array> arrays_;
     std::vector<Scalars*> scalars_;
@@ -190,6 +200,7 @@ class Scene {
     int32_t refusal_status_ = krnumer::kOutOfMemory;
     int32_t refused_allocation_ = 0;
     Variation* variation_ = nullptr;  // null: arguments as the scene gives them
+    Malformed* malformed_ = nullptr;
     int32_t result_ = 0;
     int32_t status_ = 0;
 };

@@ -112,6 +112,18 @@ TEST_P(ExportSweep, ReportsEveryRefusedAllocationAtTheLeastAlignment) {
     RefuseAllocations();
 }
 
+TEST_P(ExportSweep, TouchesNothingOfMalformedArrays) {
+    for (const int32_t size : {-1, -2, INT32_MIN}) {
+        Malformed malformed{0, size, true};
+        for (; malformed.met; ++malformed.array) {
+            malformed.met = false;
+            Scene scene(&malformed);
+            GetParam().play(scene);
+            KrrtCloseInstance(nullptr);
+        }
+    }
+}
+
 INSTANTIATE_TEST_SUITE_P(All, ExportSweep, testing::ValuesIn(Entries()),
                          [](const auto& entry) { return entry.param.scene_name; });
 
