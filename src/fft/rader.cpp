@@ -52,7 +52,7 @@ struct Split {
 // A value of the convolution's spectrum, which is the conjugate of the samples' times the kernel's, so that one more
 // forward transform gives the conjugate of the inverse one.
 Complex ConjugateProduct(Complex z, Complex w) {
-    return {z.re * w.re - z.im * w.im, -z.re * w.im - z.im * w.re};
+    return {z.re * w.re - z.im * w.im, z.re * -w.im - z.im * w.re};
 }
 
 template <class Values>
@@ -135,10 +135,10 @@ int32_t TransformLanesByRader(int32_t r, const In& in, const Out& out, const sta
     };
     for (int32_t k = 0; k < count; ++k) {
         Complex* const row = side_by_side + ptrdiff_t{k} * lanes;
-        for (int32_t l = 0; l < lanes; ++l) {
-            row[l] = in(tables.raderIn[k + 1], l);
-            total[l] += row[l];
-        }
+        for (int32_t l = 0; l < lanes; ++l) row[l] = in(tables.raderIn[k + 1], l);
+        const double* values = &row->re;  // as doubles, for vectors
+        double* sums = &total->re;
+        for (int32_t i = 0; i < 2 * lanes; ++i) sums[i] += values[i];
     }
     for (int32_t l = 0; l < lanes; ++l) out(0, l, total[l]);
     if (const int32_t status = transform()) return status;
