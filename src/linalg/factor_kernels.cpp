@@ -136,7 +136,7 @@ void Subtract(const ProductOperands<T>& in) {
     const hn::ScalableTag<double> d;
     const size_t first = in.rows == 1 ? SubtractColumns<8>(d, in, 0) : 0;
     const size_t column = SubtractColumns<2>(d, in, first);
-    ByFallingLength<T>(column, [&in](auto d, size_t first) HWY_ATTR { return SubtractColumns<1>(d, in, first); });
+    ByFallingLength<T>(column, [&in](auto tag, size_t at) HWY_ATTR { return SubtractColumns<1>(tag, in, at); });
 }
 
 template <class T>

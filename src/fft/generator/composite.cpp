@@ -176,9 +176,16 @@ Spectrum Transform32(Program& p, std::span<const Term> x) {
     for (int k = 1; k < 8; ++k) {
         const Term re = odd.real[k], im = odd.imaginary[k];
         const LongReal c = Cosine(k, 32), s = Sine(k, 32);
-        const bool diagonal = k == 4;
-        const Term t_re = diagonal ? p.Scale(c, p.Add(re, im)) : p.Add(p.Scale(c, re), p.Scale(s, im));
-        const Term t_im = diagonal ? p.Scale(c, p.Subtract(im, re)) : p.Subtract(p.Scale(c, im), p.Scale(s, re));
+        Term t_re, t_im;
+        if (k == 4) {
+            t_re = p.Scale(c, p.Add(re, im));
+            t_im = p.Scale(c, p.Subtract(im, re));
+        } else {  // products as arguments would be written in an order of the compiler's choice
+            const Term s_im = p.Scale(s, im), c_re = p.Scale(c, re);
+            t_re = p.Add(c_re, s_im);
+            const Term s_re = p.Scale(s, re), c_im = p.Scale(c, im);
+            t_im = p.Subtract(c_im, s_re);
+        }
         y.real[k] = p.Add(even.real[k], t_re);
         y.imaginary[k] = p.Add(even.imaginary[k], t_im);
         y.real[16 - k] = p.Subtract(even.real[k], t_re);
