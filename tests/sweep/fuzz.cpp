@@ -7,8 +7,8 @@
 namespace sweep {
 namespace {
 
-constexpr uint64_t kHostBytes = uint64_t{1} << 19;     // of one array
-constexpr uint64_t kScratchBytes = uint64_t{1} << 20;  // of one allocation; a copy of any array has to fit
+constexpr uint64_t kHostBytes = uint64_t{1} << 20;     // of one array; the thousands of rows of some scenes have to fit
+constexpr uint64_t kScratchBytes = uint64_t{1} << 21;  // of one allocation; a copy of any array has to fit
 constexpr int32_t kFirstStatus = -20999, kLastStatus = -20000;
 
 // The place of a scene does not change when others join: it comes from the name alone (FNV-1a).
