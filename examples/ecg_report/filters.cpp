@@ -97,7 +97,7 @@ Plot RecursivePlot(double rate) {
     BWCoefs(&rate, &kCutoff, &kUnused, &kOrder, &kType, filter.a.handle(), filter.b.handle(), &err);
     add("BWCoefs", "Butterworth");
     BesselCoefs(&rate, &kCutoff, &kUnused, &kOrder, &kType, filter.a.handle(), filter.b.handle(), &err);
-    add("BesselCoefs", "BesselCoefs");
+    add("BesselCoefs", "Bessel");
     ChebyshevCoefs(&rate, &kCutoff, &kUnused, &kRipple, &kOrder, &kType, filter.a.handle(), filter.b.handle(), &err);
     add("ChebyshevCoefs", "Chebyshev, 1 dB");
     InvChebyshevCoefs(&rate, &kStop, &kUnused, &kAttenuation, &kOrder, &kType, filter.a.handle(), filter.b.handle(),
